@@ -1,0 +1,177 @@
+#pragma once
+// CDorArray: the growable array of the foundation library.
+//
+// Storage rules that callers rely on:
+// - new elements are zero-filled and then default-constructed;
+// - growing relocates elements bitwise (never copy-constructs them), so an element must not
+//   hold a pointer into itself;
+// - the automatic growth step is size/8 clamped to 4..1024, and a grown array holds
+//   max(newSize, maxSize + step) elements.
+// Indexed access is bounds-checked in debug builds only.
+#include <cassert>
+#include <cstdlib>
+#include <cstring>
+#include <new>
+#include <type_traits>
+
+template <class TYPE, class ARG_TYPE = const TYPE&>
+class CDorArray {
+public:
+    TYPE* data;   // null when the array has no storage
+    int size;     // elements in use
+    int maxSize;  // elements allocated
+    int growBy;   // growth step; 0 = automatic
+
+    CDorArray() : data(nullptr), size(0), maxSize(0), growBy(0) {}
+    CDorArray(const CDorArray& other) : data(nullptr), size(0), maxSize(0), growBy(0) { CopyFrom(other); }
+    CDorArray& operator=(const CDorArray& other)
+    {
+        if (this != &other)
+            CopyFrom(other);
+        return *this;
+    }
+    ~CDorArray() { SetSize(0); }
+
+    int GetSize() const { return size; }
+    TYPE* GetData() { return data; }
+    const TYPE* GetData() const { return data; }
+
+    TYPE& operator[](int i)
+    {
+        assert(i >= 0 && i < size);
+        return data[i];
+    }
+    const TYPE& operator[](int i) const
+    {
+        assert(i >= 0 && i < size);
+        return data[i];
+    }
+
+    void RemoveAll() { SetSize(0); }
+
+    void SetSize(int newSize, int newGrowBy = -1) { Resize(newSize, newGrowBy, true); }
+
+    // Stores a copy of element at index, growing the array first when index is past the end.
+    void SetAtGrow(int index, ARG_TYPE element)
+    {
+        assert(index >= 0);
+        if (index < size) {
+            data[index] = element;
+            return;
+        }
+        if (Holds(&element)) {  // growing would move the source out from under us
+            TYPE copy(element);
+            SetAtGrow(index, copy);
+            return;
+        }
+        if constexpr (std::is_trivially_copyable<TYPE>::value) {
+            // Zero-fill, construct and assign end with the source's bytes: write them directly.
+            int old = size;
+            Resize(index + 1, -1, false);
+            ConstructRange(old, index);
+            std::memcpy(static_cast<void*>(data + index), static_cast<const void*>(&element), sizeof(TYPE));
+        } else {
+            SetSize(index + 1);
+            data[index] = element;
+        }
+    }
+
+    int Add(ARG_TYPE element)
+    {
+        int index = size;
+        SetAtGrow(index, element);
+        return index;
+    }
+
+private:
+    bool Holds(const void* p) const
+    {
+        const char* c = static_cast<const char*>(p);
+        const char* begin = reinterpret_cast<const char*>(data);
+        return data && c >= begin && c < begin + sizeof(TYPE) * static_cast<size_t>(maxSize);
+    }
+
+    void ConstructRange(int from, int to)
+    {
+        if (to <= from)
+            return;
+        std::memset(static_cast<void*>(data + from), 0, sizeof(TYPE) * static_cast<size_t>(to - from));
+        for (int i = from; i < to; ++i)
+            ::new (static_cast<void*>(data + i)) TYPE();
+    }
+
+    void DestroyRange(int from, int to)
+    {
+        if constexpr (!std::is_trivially_destructible<TYPE>::value) {
+            for (int i = from; i < to; ++i)
+                data[i].~TYPE();
+        }
+    }
+
+    static TYPE* Reallocate(TYPE* old, int count)
+    {
+        // NOTE: realloc is the bitwise relocation the growth rule asks for; for large blocks the C
+        // runtime can move pages instead of bytes, which keeps the fixed 1024-element step cheap.
+        void* p = std::realloc(static_cast<void*>(old), sizeof(TYPE) * static_cast<size_t>(count));
+        if (!p)
+            throw std::bad_alloc();
+        return static_cast<TYPE*>(p);
+    }
+
+    void Resize(int newSize, int newGrowBy, bool construct)
+    {
+        if (newGrowBy != -1)
+            growBy = newGrowBy;
+        if (newSize <= 0) {
+            DestroyRange(0, size);
+            std::free(static_cast<void*>(data));
+            data = nullptr;
+            size = maxSize = 0;
+            return;
+        }
+        if (!data) {
+            data = Reallocate(nullptr, newSize);
+            if (construct)
+                ConstructRange(0, newSize);
+            size = maxSize = newSize;
+            return;
+        }
+        if (newSize <= maxSize) {
+            if (newSize > size) {
+                if (construct)
+                    ConstructRange(size, newSize);
+            } else {
+                DestroyRange(newSize, size);
+            }
+            size = newSize;
+            return;
+        }
+        int step = growBy;
+        if (step == 0) {
+            step = size / 8;
+            step = step < 4 ? 4 : (step > 1024 ? 1024 : step);
+        }
+        int newMax = maxSize + step > newSize ? maxSize + step : newSize;
+        data = Reallocate(data, newMax);
+        if (construct)
+            ConstructRange(size, newSize);
+        size = newSize;
+        maxSize = newMax;
+    }
+
+    // SetSize to the source's count, then element-wise assignment.
+    void CopyFrom(const CDorArray& other)
+    {
+        if constexpr (std::is_trivially_copyable<TYPE>::value) {
+            // Same bytes as construct-then-assign, written once.
+            Resize(other.size, -1, false);
+            if (size > 0)
+                std::memcpy(static_cast<void*>(data), static_cast<const void*>(other.data),
+                            sizeof(TYPE) * static_cast<size_t>(size));
+        } else {
+            SetSize(other.size);
+            for (int i = 0; i < size; ++i)
+                data[i] = other.data[i];
+        }
+    }
+};

@@ -1,0 +1,26 @@
+#!/usr/bin/env bash
+# Builds the three presets and runs every test: the portable tests natively under ASan and
+# UBSan, then the Windows tests under Wine on a virtual X display. Exits non-zero on any failure.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+source scripts/setup.sh
+karvel_require_packages "${KARVEL_BUILD_PACKAGES[@]}"
+
+for preset in native mingw64 mingw32; do
+  echo "== build $preset"
+  cmake --preset "$preset" >/dev/null
+  cmake --build --preset "$preset" -j "$(karvel_jobs)"
+done
+
+echo "== 32-bit DLL imports"
+scripts/check-imports.sh i686-w64-mingw32-objdump build/mingw32/bin/karvel.dll
+
+status=0
+echo "== native tests"
+ctest --preset native || status=1
+
+echo "== Windows tests under Wine"
+karvel_wine_env "$PWD/build/mingw64"
+xvfb-run -a -s "-screen 0 1280x1024x24" ctest --preset mingw64 || status=1
+wineserver -k 2>/dev/null || true
+exit $status

@@ -1,0 +1,105 @@
+#include <gtest/gtest.h>
+
+#include <vector>
+
+#include "model/dor_list.h"
+
+namespace {
+std::vector<int> Contents(const CDorList& list)
+{
+    std::vector<int> out;
+    for (_DorPosition* p = list.GetHeadPosition(); p; p = CDorList::GetNextPosition(p))
+        out.push_back(*static_cast<int*>(CDorList::GetAt(p)));
+    return out;
+}
+}  // namespace
+
+TEST(DorList, HandlesStayValidWhileOthersAreRemoved)
+{
+    int v[25];
+    CDorList list;
+    _DorPosition* handle[25];
+    for (int i = 0; i < 25; ++i) {  // spans three blocks of 10
+        v[i] = i;
+        handle[i] = list.AddTail(&v[i]);
+    }
+    for (int i = 0; i < 25; i += 2)
+        list.RemoveAt(handle[i]);
+    EXPECT_EQ(list.GetCount(), 12);
+    for (int i = 1; i < 25; i += 2)
+        EXPECT_EQ(CDorList::GetAt(handle[i]), &v[i]);
+    EXPECT_EQ(Contents(list), (std::vector<int>{1, 3, 5, 7, 9, 11, 13, 15, 17, 19, 21, 23}));
+}
+
+TEST(DorList, RemovedNodeIsReusedFirst)
+{
+    int a = 1, b = 2, c = 3;
+    CDorList list;
+    list.AddTail(&a);
+    _DorPosition* hb = list.AddTail(&b);
+    list.RemoveAt(hb);
+    EXPECT_EQ(list.AddTail(&c), hb);
+}
+
+TEST(DorList, NodesOfABlockAreHandedOutInOrder)
+{
+    int a = 1, b = 2;
+    CDorList list;
+    _DorPosition* first = list.AddTail(&a);
+    _DorPosition* second = list.AddTail(&b);
+    EXPECT_EQ(reinterpret_cast<char*>(second) - reinterpret_cast<char*>(first),
+              static_cast<long>(sizeof(CDorList::Node)));
+}
+
+TEST(DorList, LastRemovalFreesEveryBlock)
+{
+    int a = 1, b = 2;
+    CDorList list;
+    _DorPosition* ha = list.AddTail(&a);
+    _DorPosition* hb = list.AddTail(&b);
+    list.RemoveAt(ha);
+    EXPECT_NE(list.blocks, nullptr);
+    list.RemoveAt(hb);
+    EXPECT_EQ(list.blocks, nullptr);
+    EXPECT_EQ(list.freeList, nullptr);
+    EXPECT_EQ(list.head, nullptr);
+    EXPECT_EQ(list.tail, nullptr);
+    list.AddTail(&a);
+    EXPECT_NE(list.blocks, nullptr);
+    EXPECT_EQ(Contents(list), std::vector<int>{1});
+}
+
+TEST(DorList, MovingToHeadOrTailWritesTheHandleBack)
+{
+    int v[4] = {0, 1, 2, 3};
+    CDorList list;
+    _DorPosition* h[4];
+    for (int i = 0; i < 4; ++i)
+        h[i] = list.AddTail(&v[i]);
+    list.MoveToHead(h[2]);
+    EXPECT_EQ(Contents(list), (std::vector<int>{2, 0, 1, 3}));
+    list.MoveToTail(h[0]);
+    EXPECT_EQ(Contents(list), (std::vector<int>{2, 1, 3, 0}));
+    EXPECT_EQ(CDorList::GetAt(h[0]), &v[0]);
+
+    CDorList single;
+    _DorPosition* only = single.AddTail(&v[1]);
+    single.MoveToHead(only);  // frees every block on the way: the handle must be the new one
+    EXPECT_EQ(single.GetCount(), 1);
+    EXPECT_EQ(single.GetHeadPosition(), only);
+    EXPECT_EQ(CDorList::GetAt(only), &v[1]);
+}
+
+TEST(DorList, NullHandleDoesNothingAndCopiesKeepOrder)
+{
+    int a = 1, b = 2;
+    CDorList list;
+    list.AddTail(&a);
+    list.AddHead(&b);
+    list.RemoveAt(nullptr);
+    EXPECT_EQ(list.GetCount(), 2);
+    CDorList copy(list);
+    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1}));
+    copy = CDorList();
+    EXPECT_EQ(copy.GetCount(), 0);
+}
