@@ -24,19 +24,6 @@ void VelNormalize2(DorVector2& v)
     }
 }
 
-bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1)
-{
-    DorVector2 d = VelSub2(p1, p0), e = VelSub2(a1, a0);
-    double det = VelCross2(e, d);
-    if (det == 0.0)
-        return false;
-    // p0 + s d = a0 + t e
-    DorVector2 w = VelSub2(a0, p0);
-    double s = VelCross2(e, w) / det;
-    double t = VelCross2(d, w) / det;
-    return s > 0.0 && s < 1.0 && t > 0.0 && t < 1.0;
-}
-
 double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count)
 {
     double sum = 0.0;

@@ -16,7 +16,19 @@ void VelNormalize2(DorVector2& v);
 
 // Whether segment p0-p1 crosses segment a0-a1 at a point strictly inside both. Parallel segments
 // (cross product exactly 0) never cross.
-bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1);
+// Inline: the triangulations call it for every candidate against every listed edge.
+inline bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1)
+{
+    DorVector2 d = VelSub2(p1, p0), e = VelSub2(a1, a0);
+    double det = VelCross2(e, d);
+    if (det == 0.0)
+        return false;
+    // p0 + s d = a0 + t e
+    DorVector2 w = VelSub2(a0, p0);
+    double s = VelCross2(e, w) / det;
+    double t = VelCross2(d, w) / det;
+    return s > 0.0 && s < 1.0 && t > 0.0 && t < 1.0;
+}
 
 // The signed angle that the closed loop[0..count-1] subtends at q, summed edge by edge with
 // atan2(cross, dot). An edge with an end exactly on q (cross and dot both 0) adds nothing.

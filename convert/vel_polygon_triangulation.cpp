@@ -83,9 +83,12 @@ bool Triangulation::Admissible(int i, int j) const
     return VelWindingInside(VelWindingAngle(mid, plane.data(), n));
 }
 
+// The added edges are tried before the outline's: they are the ones that usually cross.
 bool Triangulation::CrossesListedEdge(int i, int j) const
 {
-    for (const Edge& e : edges) {
+    const int count = static_cast<int>(edges.size());
+    for (int k = n; k < count + n; ++k) {
+        const Edge& e = edges[k < count ? k : k - count];
         if (e.start == i || e.start == j || e.end == i || e.end == j)
             continue;
         if (VelSegmentsCross(plane[i], plane[j], plane[e.start], plane[e.end]))
