@@ -1,23 +1,7 @@
 // The shape classes' field order and widths are part of the binary interface: hosts fill the
 // fields directly. Any change here is a breaking change.
-#include <cstddef>
-
 #include "convert/dor_shape.h"
-
-#if defined(__GNUC__)
-// NOTE: offsetof on a class with a virtual table is conditionally supported; GCC, Clang and MSVC
-// all give the real offset.
-#  pragma GCC diagnostic ignored "-Winvalid-offsetof"
-#endif
-
-#define KARVEL_FIELD(T, f, off) static_assert(offsetof(T, f) == (off), #T "::" #f " moved")
-#define KARVEL_SIZE(T, n) static_assert(sizeof(T) == (n), "size of " #T " changed")
-
-#if defined(_WIN32) && !defined(_WIN64)
-#  define KARVEL_PICK(bits32, bits64) (bits32)
-#else
-#  define KARVEL_PICK(bits32, bits64) (bits64)
-#endif
+#include "model/dor_layout_check.h"
 
 KARVEL_FIELD(CDorGeometry, tag, KARVEL_PICK(4, 8));
 KARVEL_FIELD(CDorGeometry, kind, KARVEL_PICK(8, 12));
