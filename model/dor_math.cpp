@@ -3,8 +3,6 @@
 #include <cmath>
 
 namespace {
-const double kPi = 3.14159265358979323846;
-
 double Snap(double v) { return std::fabs(v) < 1e-6 ? 0.0 : v; }
 }  // namespace
 
@@ -43,11 +41,11 @@ DorDirectionKind DorDirectionAngles(const DorVector3& d, double& elevation, doub
     if (d.x != 0.0) {
         azimuth = std::atan(d.y / d.x);
         if (d.x < 0.0)
-            azimuth += kPi;
+            azimuth += DorPi;
     } else if (d.y < 0.0) {
-        azimuth = -kPi / 2;
+        azimuth = -DorPi / 2;
     } else if (d.y > 0.0) {
-        azimuth = kPi / 2;
+        azimuth = DorPi / 2;
     } else {
         azimuth = 0.0;
         return DorDirectionVertical;
@@ -106,6 +104,36 @@ DorMatrix4x4 operator*(const DorMatrix4x4& a, const DorMatrix4x4& b)
     return r;
 }
 
+bool DorInvert(const DorMatrix4x4& matrix, double minDeterminant, DorMatrix4x4& out)
+{
+    const double* a = &matrix.m[0][0];
+    double inv[16];
+    // Cofactors of the transposed matrix (the adjugate), laid out like the input.
+    inv[0] = a[5] * a[10] * a[15] - a[5] * a[11] * a[14] - a[9] * a[6] * a[15] + a[9] * a[7] * a[14] + a[13] * a[6] * a[11] - a[13] * a[7] * a[10];
+    inv[4] = -a[4] * a[10] * a[15] + a[4] * a[11] * a[14] + a[8] * a[6] * a[15] - a[8] * a[7] * a[14] - a[12] * a[6] * a[11] + a[12] * a[7] * a[10];
+    inv[8] = a[4] * a[9] * a[15] - a[4] * a[11] * a[13] - a[8] * a[5] * a[15] + a[8] * a[7] * a[13] + a[12] * a[5] * a[11] - a[12] * a[7] * a[9];
+    inv[12] = -a[4] * a[9] * a[14] + a[4] * a[10] * a[13] + a[8] * a[5] * a[14] - a[8] * a[6] * a[13] - a[12] * a[5] * a[10] + a[12] * a[6] * a[9];
+    inv[1] = -a[1] * a[10] * a[15] + a[1] * a[11] * a[14] + a[9] * a[2] * a[15] - a[9] * a[3] * a[14] - a[13] * a[2] * a[11] + a[13] * a[3] * a[10];
+    inv[5] = a[0] * a[10] * a[15] - a[0] * a[11] * a[14] - a[8] * a[2] * a[15] + a[8] * a[3] * a[14] + a[12] * a[2] * a[11] - a[12] * a[3] * a[10];
+    inv[9] = -a[0] * a[9] * a[15] + a[0] * a[11] * a[13] + a[8] * a[1] * a[15] - a[8] * a[3] * a[13] - a[12] * a[1] * a[11] + a[12] * a[3] * a[9];
+    inv[13] = a[0] * a[9] * a[14] - a[0] * a[10] * a[13] - a[8] * a[1] * a[14] + a[8] * a[2] * a[13] + a[12] * a[1] * a[10] - a[12] * a[2] * a[9];
+    inv[2] = a[1] * a[6] * a[15] - a[1] * a[7] * a[14] - a[5] * a[2] * a[15] + a[5] * a[3] * a[14] + a[13] * a[2] * a[7] - a[13] * a[3] * a[6];
+    inv[6] = -a[0] * a[6] * a[15] + a[0] * a[7] * a[14] + a[4] * a[2] * a[15] - a[4] * a[3] * a[14] - a[12] * a[2] * a[7] + a[12] * a[3] * a[6];
+    inv[10] = a[0] * a[5] * a[15] - a[0] * a[7] * a[13] - a[4] * a[1] * a[15] + a[4] * a[3] * a[13] + a[12] * a[1] * a[7] - a[12] * a[3] * a[5];
+    inv[14] = -a[0] * a[5] * a[14] + a[0] * a[6] * a[13] + a[4] * a[1] * a[14] - a[4] * a[2] * a[13] - a[12] * a[1] * a[6] + a[12] * a[2] * a[5];
+    inv[3] = -a[1] * a[6] * a[11] + a[1] * a[7] * a[10] + a[5] * a[2] * a[11] - a[5] * a[3] * a[10] - a[9] * a[2] * a[7] + a[9] * a[3] * a[6];
+    inv[7] = a[0] * a[6] * a[11] - a[0] * a[7] * a[10] - a[4] * a[2] * a[11] + a[4] * a[3] * a[10] + a[8] * a[2] * a[7] - a[8] * a[3] * a[6];
+    inv[11] = -a[0] * a[5] * a[11] + a[0] * a[7] * a[9] + a[4] * a[1] * a[11] - a[4] * a[3] * a[9] - a[8] * a[1] * a[7] + a[8] * a[3] * a[5];
+    inv[15] = a[0] * a[5] * a[10] - a[0] * a[6] * a[9] - a[4] * a[1] * a[10] + a[4] * a[2] * a[9] + a[8] * a[1] * a[6] - a[8] * a[2] * a[5];
+
+    double determinant = a[0] * inv[0] + a[1] * inv[4] + a[2] * inv[8] + a[3] * inv[12];
+    if (!(std::fabs(determinant) >= minDeterminant) || !std::isfinite(determinant))
+        return false;
+    for (int k = 0; k < 16; ++k)
+        out.m[k / 4][k % 4] = inv[k] / determinant;
+    return true;
+}
+
 DorVector3 DorTransformPoint(const DorVector3& p, const DorMatrix4x4& m)
 {
     return DorVector3(p.x * m.m[0][0] + p.y * m.m[1][0] + p.z * m.m[2][0] + m.m[3][0],
@@ -126,9 +154,9 @@ DorMatrix4x4 DorPlaneProjection(const DorVector3& normal, const DorVector3& anch
     double elevation = 0, azimuth = 0;
     switch (DorDirectionAngles(normal, elevation, azimuth)) {
     case DorDirectionSloped:
-        return translation * (DorRotateZ(-kPi / 2 - azimuth) * DorRotateX(elevation - kPi / 2));
+        return translation * (DorRotateZ(-DorPi / 2 - azimuth) * DorRotateX(elevation - DorPi / 2));
     case DorDirectionVertical:
-        return translation * DorRotateY(kPi / 2 - elevation);
+        return translation * DorRotateY(DorPi / 2 - elevation);
     default:
         return translation;
     }
