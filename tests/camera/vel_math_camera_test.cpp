@@ -270,10 +270,10 @@ TEST(Moves, NonFiniteCamerasAndArgumentsAreRefused)
     CVelMathCamera::RoundDolly(c, kNaN, 0);
     EXPECT_TRUE(SameCameraBits(c, fine));
 
-    _VelCamera far = Camera(DorVector3(1e308, 0, 0), DorVector3(1e308, 5, 0));
-    _VelCamera farBefore = far;
-    CVelMathCamera::Dolly(far, 0, -1e308, 0, 0);  // left of +y is -x: 1e308 + 1e308 overflows
-    EXPECT_TRUE(SameCameraBits(far, farBefore));
+    _VelCamera distant = Camera(DorVector3(1e308, 0, 0), DorVector3(1e308, 5, 0));
+    _VelCamera distantBefore = distant;
+    CVelMathCamera::Dolly(distant, 0, -1e308, 0, 0);  // left of +y is -x: 1e308 + 1e308 overflows
+    EXPECT_TRUE(SameCameraBits(distant, distantBefore));
 }
 
 // ---- viewport zoom ----
