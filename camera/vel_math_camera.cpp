@@ -30,15 +30,6 @@ DorMatrix4x4 ToView(const _VelCamera& camera, double dist)
     out = out * DorRotateX(-(elevation + DorPi / 2));
     return out * DorTranslate(0.0, 0.0, dist);
 }
-
-// Truncates toward zero into an int; false when the value has no int of that kind.
-bool TruncateToInt(double value, int& out)
-{
-    if (!(value > -2147483649.0 && value < 2147483648.0))
-        return false;
-    out = static_cast<int>(value);
-    return true;
-}
 }  // namespace
 
 bool VelCameraIsFinite(const _VelCamera& c)
@@ -135,7 +126,7 @@ int CVelMathCamera::ViewportZoom(const _VelCamera& camera, _VelViewport& viewpor
     double x0 = corner0.x < 0.0 ? 0.0 : corner0.x, y0 = corner0.y < 0.0 ? 0.0 : corner0.y;
     double x1 = corner1.x > vx + vw ? vx + vw : corner1.x, y1 = corner1.y > vy + vh ? vy + vh : corner1.y;
     int w = 0, h = 0;
-    if (!TruncateToInt(x1 - x0, w) || !TruncateToInt(y1 - y0, h))
+    if (!DorTruncateToInt(x1 - x0, w) || !DorTruncateToInt(y1 - y0, h))
         return 0;
     viewport.width = w;
     viewport.height = h;
@@ -158,12 +149,14 @@ int CVelMathCamera::ViewportZoom(const _VelCamera& camera, _VelViewport& viewpor
     if (y0 + fitH > vy + vh)
         y0 = y1 - fitH;
 
+    // No single zoom magnifies more than five times; a scale that is not positive only comes
+    // from an aspect that is not, and is refused too.
     const double scale = vw / fitW;
-    if (scale > 5.0)
+    if (!(scale > 0.0 && scale <= 5.0))
         return 0;
     _VelViewport zoomed;
-    if (!TruncateToInt((vx - x0) * scale, zoomed.x) || !TruncateToInt((vy - (vy + vh - y0 - fitH)) * scale, zoomed.y) ||
-        !TruncateToInt(vw * scale, zoomed.width) || !TruncateToInt(vh * scale, zoomed.height))
+    if (!DorTruncateToInt((vx - x0) * scale, zoomed.x) || !DorTruncateToInt((vy - (vy + vh - y0 - fitH)) * scale, zoomed.y) ||
+        !DorTruncateToInt(vw * scale, zoomed.width) || !DorTruncateToInt(vh * scale, zoomed.height))
         return 0;
     viewport = zoomed;
     return 1;

@@ -15,13 +15,16 @@ _VelCamera BlankCamera()
     return camera;
 }
 
-// Truncates a pixel coordinate toward zero; false when no int holds it.
-bool PixelToInt(double value, int& out)
+// Reads the modeller's camera, moves it, writes it back. A camera that is not finite (only
+// possible when the modeller handed one out) is never written back.
+template <class Move>
+void MoveOwnCamera(CVelKarvel& modeller, Move move)
 {
-    if (!(value > -2147483649.0 && value < 2147483648.0))
-        return false;
-    out = static_cast<int>(value);
-    return true;
+    _VelCamera camera = BlankCamera();
+    modeller.GetCamera(camera);
+    move(camera);
+    if (VelCameraIsFinite(camera))
+        modeller.SetCamera(camera);
 }
 }  // namespace
 
@@ -59,42 +62,24 @@ int CVelKarvel::ChangeTexture(unsigned int, _DorBitmap&) { return 0; }
 void CVelKarvel::RemoveAllTexture() {}
 CDorArray<_DorBitmap, _DorBitmap&>* CVelKarvel::GetTextureList() { return nullptr; }
 
-// Camera moves: read through GetCamera, move, write back through SetCamera. A camera that is not
-// finite (only possible when the modeller handed one out) is never written back.
 void CVelKarvel::PanTilt(double pan, double tilt)
 {
-    _VelCamera camera = BlankCamera();
-    GetCamera(camera);
-    CVelMathCamera::PanTilt(camera, pan, tilt);
-    if (VelCameraIsFinite(camera))
-        SetCamera(camera);
+    MoveOwnCamera(*this, [&](_VelCamera& c) { CVelMathCamera::PanTilt(c, pan, tilt); });
 }
 
 void CVelKarvel::Dolly(double forward, double left, double up, int eyeOnly)
 {
-    _VelCamera camera = BlankCamera();
-    GetCamera(camera);
-    CVelMathCamera::Dolly(camera, forward, left, up, eyeOnly);
-    if (VelCameraIsFinite(camera))
-        SetCamera(camera);
+    MoveOwnCamera(*this, [&](_VelCamera& c) { CVelMathCamera::Dolly(c, forward, left, up, eyeOnly); });
 }
 
 void CVelKarvel::Fly(double forward, double right, double up, int eyeOnly)
 {
-    _VelCamera camera = BlankCamera();
-    GetCamera(camera);
-    CVelMathCamera::Fly(camera, forward, right, up, eyeOnly);
-    if (VelCameraIsFinite(camera))
-        SetCamera(camera);
+    MoveOwnCamera(*this, [&](_VelCamera& c) { CVelMathCamera::Fly(c, forward, right, up, eyeOnly); });
 }
 
 void CVelKarvel::RoundDolly(double elevation, double azimuth)
 {
-    _VelCamera camera = BlankCamera();
-    GetCamera(camera);
-    CVelMathCamera::RoundDolly(camera, elevation, azimuth);
-    if (VelCameraIsFinite(camera))
-        SetCamera(camera);
+    MoveOwnCamera(*this, [&](_VelCamera& c) { CVelMathCamera::RoundDolly(c, elevation, azimuth); });
 }
 
 int CVelKarvel::ViewportZoom(DorVector2 corner0, DorVector2 corner1)
@@ -120,7 +105,7 @@ void CVelKarvel::ApproachCamera(DorVector2 point, double height, int useDepth)
     double depth = 0.0;
     HDC dc = useDepth ? GetCurrent() : nullptr;
     int x = 0, y = 0;
-    if (dc != nullptr && PixelToInt(point.x, x) && PixelToInt(point.y, y)) {
+    if (dc != nullptr && DorTruncateToInt(point.x, x) && DorTruncateToInt(point.y, y)) {
         CDorArray<_VelSelect, _VelSelect&> hits;
         HitTest(dc, x, y, hits);
         if (hits.GetSize() > 0) {

@@ -104,6 +104,14 @@ DorMatrix4x4 operator*(const DorMatrix4x4& a, const DorMatrix4x4& b)
     return r;
 }
 
+bool DorTruncateToInt(double value, int& out)
+{
+    if (!(value > -2147483649.0 && value < 2147483648.0))
+        return false;
+    out = static_cast<int>(value);
+    return true;
+}
+
 bool DorInvert(const DorMatrix4x4& matrix, double minDeterminant, DorMatrix4x4& out)
 {
     const double* a = &matrix.m[0][0];

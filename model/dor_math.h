@@ -35,6 +35,9 @@ KARVEL_API DorMatrix4x4 DorRotateZ(double radians);
 KARVEL_API DorMatrix4x4 DorTranslate(double x, double y, double z);
 KARVEL_API DorMatrix4x4 operator*(const DorMatrix4x4& a, const DorMatrix4x4& b);
 
+// Truncates toward zero into an int; false (out untouched) for NaN or a value no int holds.
+KARVEL_API bool DorTruncateToInt(double value, int& out);
+
 // Inverse as the adjugate over the determinant; false (out untouched) when |determinant| is
 // below minDeterminant or not finite.
 KARVEL_API bool DorInvert(const DorMatrix4x4& m, double minDeterminant, DorMatrix4x4& out);

@@ -114,3 +114,20 @@ TEST(Invert, UndoesARigidMoveAndRefusesSingularMatrices)
     flat.m[2][2] = std::nan("");
     EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
 }
+
+TEST(TruncateToInt, TowardZeroWithinIntRangeOnly)
+{
+    int out = 7;
+    EXPECT_TRUE(DorTruncateToInt(-2.9, out));
+    EXPECT_EQ(out, -2);
+    EXPECT_TRUE(DorTruncateToInt(2147483647.9, out));
+    EXPECT_EQ(out, 2147483647);
+    EXPECT_TRUE(DorTruncateToInt(-2147483648.9, out));
+    EXPECT_EQ(out, -2147483647 - 1);
+    out = 7;
+    EXPECT_FALSE(DorTruncateToInt(2147483648.0, out));
+    EXPECT_FALSE(DorTruncateToInt(-2147483649.0, out));
+    EXPECT_FALSE(DorTruncateToInt(std::nan(""), out));
+    EXPECT_FALSE(DorTruncateToInt(-HUGE_VAL, out));
+    EXPECT_EQ(out, 7);
+}
