@@ -12,6 +12,20 @@ double Radians(double degrees) { return degrees * (1.0 / 180.0) * DorPi; }
 // A new elevation must stay strictly between the poles; NaN fails too.
 bool ElevationAllowed(double degrees) { return degrees > -90.0 && degrees < 90.0; }
 
+// Raises v's elevation by rise degrees and turns it counter-clockwise about +Z by turn degrees,
+// keeping its length. False, v untouched, when v is short or vertical or would reach a pole.
+bool TurnDirection(DorVector3& v, double rise, double turn)
+{
+    double elevation = 0.0, azimuth = 0.0;
+    if (DorDirectionAngles(v, elevation, azimuth) != DorDirectionSloped)
+        return false;
+    if (!ElevationAllowed(elevation * kDegreesPerRadian + rise))
+        return false;
+    DorMatrix4x4 m = DorRotateZ(-azimuth) * DorRotateY(-Radians(rise)) * DorRotateZ(azimuth + Radians(turn));
+    v = DorTransformDirection(v, m);
+    return true;
+}
+
 // Every move works on a copy and lands here: a non-finite result is refused like any other.
 void Commit(_VelCamera& camera, const _VelCamera& moved)
 {
@@ -34,8 +48,8 @@ DorMatrix4x4 ToView(const _VelCamera& camera, double dist)
 
 bool VelCameraIsFinite(const _VelCamera& c)
 {
-    const double fields[] = {c.eye.x,    c.eye.y, c.eye.z, c.target.x, c.target.y, c.target.z,
-                             c.fovy, c.zNear, c.zFar,  c.aspect};
+    const double fields[] = {c.eye.x, c.eye.y, c.eye.z, c.target.x, c.target.y, c.target.z,
+                             c.fovy,  c.zNear, c.zFar, c.aspect};
     for (double v : fields)
         if (!std::isfinite(v))
             return false;
@@ -66,14 +80,10 @@ void CVelMathMatrix::GetPerspectiveMatrix(const _VelCamera& camera, double dist,
 void CVelMathCamera::PanTilt(_VelCamera& camera, double pan, double tilt)
 {
     DorVector3 d = camera.target - camera.eye;
-    double elevation = 0.0, azimuth = 0.0;
-    if (DorDirectionAngles(d, elevation, azimuth) != DorDirectionSloped)
+    if (!TurnDirection(d, tilt, -pan))
         return;
-    if (!ElevationAllowed(elevation * kDegreesPerRadian + tilt))
-        return;
-    DorMatrix4x4 turn = DorRotateZ(-azimuth) * DorRotateY(-Radians(tilt)) * DorRotateZ(azimuth + Radians(-pan));
     _VelCamera moved = camera;
-    moved.target = camera.eye + DorTransformDirection(d, turn);
+    moved.target = camera.eye + d;
     Commit(camera, moved);
 }
 
@@ -108,18 +118,15 @@ void CVelMathCamera::Fly(_VelCamera& camera, double forward, double right, doubl
 void CVelMathCamera::RoundDolly(_VelCamera& camera, double elevation, double azimuth)
 {
     DorVector3 e = camera.eye - camera.target;
-    double el = 0.0, az = 0.0;
-    if (DorDirectionAngles(e, el, az) != DorDirectionSloped)
+    if (!TurnDirection(e, elevation, azimuth))
         return;
-    if (!ElevationAllowed(el * kDegreesPerRadian + elevation))
-        return;
-    DorMatrix4x4 orbit = DorRotateZ(-az) * DorRotateY(-Radians(elevation)) * DorRotateZ(Radians(azimuth) + az);
     _VelCamera moved = camera;
-    moved.eye = camera.target + DorTransformDirection(e, orbit);
+    moved.eye = camera.target + e;
     Commit(camera, moved);
 }
 
-int CVelMathCamera::ViewportZoom(const _VelCamera& camera, _VelViewport& viewport, DorVector2 corner0, DorVector2 corner1)
+int CVelMathCamera::ViewportZoom(const _VelCamera& camera, _VelViewport& viewport, DorVector2 corner0,
+                                 DorVector2 corner1)
 {
     const double vx = viewport.x, vy = viewport.y, vw = viewport.width, vh = viewport.height;
     // Clamped to zero on the left and top (not to vx, vy); a NaN corner stays NaN and is refused.
@@ -149,20 +156,22 @@ int CVelMathCamera::ViewportZoom(const _VelCamera& camera, _VelViewport& viewpor
     if (y0 + fitH > vy + vh)
         y0 = y1 - fitH;
 
-    // No single zoom magnifies more than five times; a scale that is not positive only comes
-    // from an aspect that is not, and is refused too.
+    // No single zoom magnifies more than five times. A negative scale only comes from a negative
+    // aspect and is refused too, as is a result that no int holds.
     const double scale = vw / fitW;
-    if (!(scale > 0.0 && scale <= 5.0))
+    if (!(scale >= 0.0 && scale <= 5.0))
         return 0;
+    const double bottom = vy + vh - y0 - fitH;  // window rows below the box, y counted upward
     _VelViewport zoomed;
-    if (!DorTruncateToInt((vx - x0) * scale, zoomed.x) || !DorTruncateToInt((vy - (vy + vh - y0 - fitH)) * scale, zoomed.y) ||
+    if (!DorTruncateToInt((vx - x0) * scale, zoomed.x) || !DorTruncateToInt((vy - bottom) * scale, zoomed.y) ||
         !DorTruncateToInt(vw * scale, zoomed.width) || !DorTruncateToInt(vh * scale, zoomed.height))
         return 0;
     viewport = zoomed;
     return 1;
 }
 
-void CVelMathCamera::ApproachCamera(_VelCamera& camera, DorVector2 point, double viewHeight, double height, double depth)
+void CVelMathCamera::ApproachCamera(_VelCamera& camera, DorVector2 point, double viewHeight, double height,
+                                    double depth)
 {
     const double t = std::tan(camera.fovy * 0.5 * (1.0 / 180.0) * DorPi);
     const double pixelDistance = viewHeight / (t + t);

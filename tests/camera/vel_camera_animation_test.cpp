@@ -81,7 +81,8 @@ TEST_F(GlideAcrossTen, EqualEndsStillDrawForTheWholeDuration)
 
 TEST_F(GlideAcrossTen, ZeroNegativeOrNonFiniteDurationsDrawNothing)
 {
-    for (double duration : {0.0, -5.0, std::numeric_limits<double>::quiet_NaN(), std::numeric_limits<double>::infinity()})
+    const double nan = std::numeric_limits<double>::quiet_NaN(), inf = std::numeric_limits<double>::infinity();
+    for (double duration : {0.0, -5.0, nan, inf})
         Glide(duration);
     EXPECT_EQ(modeller.drawCalls, 0);
     EXPECT_EQ(modeller.setCameraCalls, 0);

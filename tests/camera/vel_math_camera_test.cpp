@@ -440,7 +440,8 @@ TEST(Moves, ExtremeInputsNeverStoreANonFiniteCamera)
                 case 4: CVelMathCamera::ApproachCamera(c, DorVector2(a, b), 300, 150, 0); break;
                 default: CVelMathCamera::ApproachCamera(c, DorVector2(1, 2), a, b, values[j]); break;
                 }
-                EXPECT_TRUE(SameCameraBits(c, original) || VelCameraIsFinite(c)) << "op " << op << " i " << i << " j " << j;
+                EXPECT_TRUE(SameCameraBits(c, original) || VelCameraIsFinite(c))
+                    << "op " << op << " i " << i << " j " << j;
                 _VelViewport v = {static_cast<int>(i * 1000) - 2000, 0, 400, 300};
                 CVelMathCamera::ViewportZoom(c, v, DorVector2(a, b), DorVector2(b, a));
                 DorMatrix4x4 m;
