@@ -4,6 +4,8 @@
 #include "model/dor_types.h"
 #include "model/export.h"
 
+const double DorPi = 3.14159265358979323846;
+
 inline DorVector3 operator+(const DorVector3& a, const DorVector3& b) { return DorVector3(a.x + b.x, a.y + b.y, a.z + b.z); }
 inline DorVector3 operator-(const DorVector3& a, const DorVector3& b) { return DorVector3(a.x - b.x, a.y - b.y, a.z - b.z); }
 inline DorVector3 operator*(const DorVector3& a, double s) { return DorVector3(a.x * s, a.y * s, a.z * s); }
@@ -32,6 +34,13 @@ KARVEL_API DorMatrix4x4 DorRotateY(double radians);
 KARVEL_API DorMatrix4x4 DorRotateZ(double radians);
 KARVEL_API DorMatrix4x4 DorTranslate(double x, double y, double z);
 KARVEL_API DorMatrix4x4 operator*(const DorMatrix4x4& a, const DorMatrix4x4& b);
+
+// Truncates toward zero into an int; false (out untouched) for NaN or a value no int holds.
+KARVEL_API bool DorTruncateToInt(double value, int& out);
+
+// Inverse as the adjugate over the determinant; false (out untouched) when |determinant| is
+// below minDeterminant or not finite.
+KARVEL_API bool DorInvert(const DorMatrix4x4& m, double minDeterminant, DorMatrix4x4& out);
 
 KARVEL_API DorVector3 DorTransformPoint(const DorVector3& p, const DorMatrix4x4& m);
 // The rotation part only: no translation.

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "primitives/vel_math_primitive.h"
+#include "tests/support/recording_karvel.h"
 
 TEST(KarvelDll, PrimitiveBuiltInsideTheDllIsCopiedAndFreedByTheHost)
 {
@@ -12,4 +13,19 @@ TEST(KarvelDll, PrimitiveBuiltInsideTheDllIsCopiedAndFreedByTheHost)
     ASSERT_EQ(copy.groups.GetSize(), 1);
     EXPECT_EQ(copy.groups[0].vertices.GetSize(), 20);
     EXPECT_EQ(copy.groups[0].vertices[19].position.y, 4.0);
+}
+
+// A host's own modeller, derived from the exported interface: the camera wrappers inside the DLL
+// call back into the host's GetCamera and SetCamera through the virtual table.
+TEST(KarvelDll, CameraWrappersCallBackIntoAHostModeller)
+{
+    RecordingKarvel host;
+    host.camera.eye = DorVector3(10, 0, 0);
+    host.camera.target = DorVector3(0, 0, 0);
+    CVelKarvel& modeller = host;
+    modeller.RoundDolly(0, 90);
+    EXPECT_EQ(host.getCameraCalls, 1);
+    EXPECT_EQ(host.setCameraCalls, 1);
+    EXPECT_EQ(host.camera.eye.y, 10.0);
+    EXPECT_EQ(modeller.GetCullMode(), 1);
 }
