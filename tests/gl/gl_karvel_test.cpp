@@ -7,7 +7,9 @@
 #include <cmath>
 #include <utility>
 
+#include "camera/vel_math_camera.h"
 #include "gl/vel_gl_karvel.h"
+#include "model/dor_math.h"
 #include "support/win32_test_window.h"
 
 namespace {
@@ -167,6 +169,52 @@ TEST_F(LiveModeller, LitRectangleAppearsWhereTheCameraMathsPutsIt)
     EXPECT_TRUE(IsBackground(Draw(3.5, 0, 4.3)));
     EXPECT_TRUE(IsBackground(Draw(-3.5, 0, 2.5)));
     EXPECT_TRUE(IsBackground(Draw(3.5, 0, -2.5)));
+}
+
+TEST_F(LiveModeller, TriangleFacingASlopedCameraAppearsWhereTheViewMatrixPutsIt)
+{
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    camera.eye = DorVector3(6, -8, 5);
+    camera.target = DorVector3(1, 1, 0);
+    camera.fovy = 40;
+    karvel.SetCamera(camera);
+    karvel.GetCamera(camera);
+    DorMatrix4x4 view;
+    CVelMathMatrix::GetToViewMatrix(camera, 0, view);
+    // The world directions that the view turns onto screen right and screen up.
+    DorVector3 right(view.m[0][0], view.m[1][0], view.m[2][0]);
+    DorVector3 up(view.m[0][1], view.m[1][1], view.m[2][1]);
+    DorVector3 towardsEye = camera.eye - camera.target;
+    DorNormalize(towardsEye);
+
+    const DorVector3& centre = camera.target;
+    DorVector3 corners[] = {centre - right * 1.5 - up * 1.5, centre + right * 1.5 - up * 1.5, centre + up * 1.5};
+    CVelTrianglePolys g;
+    g.GroupType = VelGroupTriangles;
+    g.material = Matte(1, 0, 0);
+    for (const DorVector3& c : corners) {
+        AddVertex(g, c.x, c.y, c.z);
+        g.vertices[g.vertices.GetSize() - 1].normal = towardsEye;
+    }
+    CVelPrimitive p;
+    p.groups.Add(g);
+    Add(p);
+    karvel.DrawModel(window.dc);
+
+    // Perspective division of the view coordinates, one pixel per kHeight / 2 of the tangent.
+    double t = std::tan(camera.fovy / 2 / 180 * 3.14159265358979323846);
+    auto pixel = [&](const DorVector3& world) {
+        DorVector3 v = DorTransformPoint(world, view);
+        double scale = kHeight / 2.0 / (-v.z * t);
+        return PixelAt(static_cast<int>(kWidth / 2.0 + v.x * scale), static_cast<int>(kHeight / 2.0 - v.y * scale));
+    };
+    EXPECT_GT(pixel(centre).r, 150);
+    EXPECT_GT(pixel(centre - up * 1.2).r, 150);
+    EXPECT_TRUE(IsBackground(pixel(centre + right * 2)));
+    EXPECT_TRUE(IsBackground(pixel(centre - right * 2)));
+    EXPECT_TRUE(IsBackground(pixel(centre + up * 2)));
+    EXPECT_TRUE(IsBackground(pixel(centre - up * 2)));
 }
 
 TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
