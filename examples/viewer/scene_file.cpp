@@ -1,11 +1,11 @@
 #include <cmath>
 #include <initializer_list>
 #include <map>
-#include <sstream>
 
 #include <nlohmann/json.hpp>
 
 #include "bmp_file.h"
+#include "gl/vel_gl_store.h"
 #include "model/dor_math.h"
 #include "primitives/vel_math_primitive.h"
 #include "scene.h"
@@ -272,13 +272,6 @@ bool IsAbsolute(const std::string& path)
     return (!path.empty() && (path[0] == '/' || path[0] == '\\')) || (path.size() > 1 && path[1] == ':');
 }
 
-// The texture store's rule: a pixel count that is a power of two from 2 to 512 x 512.
-bool FitsTextureStore(const _DorBitmap& bitmap)
-{
-    unsigned int pixels = static_cast<unsigned int>(bitmap.info.width) * static_cast<unsigned int>(bitmap.info.height);
-    return pixels >= 2 && pixels <= 0x40000 && (pixels & (pixels - 1)) == 0;
-}
-
 class SceneReader {
 public:
     SceneReader(const std::string& baseDir, Scene& scene) : baseDir_(baseDir), scene_(scene) {}
@@ -513,7 +506,7 @@ private:
         std::string expected;
         if (!DecodeBmp(bytes, texture->bitmap, expected))
             Fail(place, expected + " (\"" + path + "\")");
-        if (!FitsTextureStore(texture->bitmap))
+        if (!VelTextureAcceptable(texture->bitmap, VelAddTextureLimit))
             Fail(place, "a texture whose width x height is a power of two up to 512 x 512 (\"" + path + "\" is " +
                             std::to_string(texture->bitmap.info.width) + " x " + std::to_string(texture->bitmap.info.height) + ")");
         int index = static_cast<int>(scene_.textures.size());
