@@ -1,0 +1,108 @@
+#include "win32_model_view.h"
+
+namespace {
+const char* ViewClassName = "KarvelViewerView";
+
+struct ViewHook {
+    ViewMessageHandler handler;
+    void* owner;
+};
+
+LRESULT CALLBACK ViewProc(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam)
+{
+    if (message == WM_NCCREATE) {
+        auto* create = reinterpret_cast<CREATESTRUCTA*>(lParam);
+        SetWindowLongPtrA(hwnd, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(create->lpCreateParams));
+    }
+    auto* hook = reinterpret_cast<ViewHook*>(GetWindowLongPtrA(hwnd, GWLP_USERDATA));
+    if (message == WM_NCDESTROY) {
+        SetWindowLongPtrA(hwnd, GWLP_USERDATA, 0);
+        delete hook;
+        return DefWindowProcA(hwnd, message, wParam, lParam);
+    }
+    if (hook && hook->handler)
+        return hook->handler(hook->owner, hwnd, message, wParam, lParam);
+    return DefWindowProcA(hwnd, message, wParam, lParam);
+}
+
+void RegisterViewClass()
+{
+    static bool registered = false;
+    if (registered)
+        return;
+    WNDCLASSA wc = {};
+    // An own DC: the modeller keeps rendering into the DC it was started on.
+    wc.style = CS_OWNDC | CS_DBLCLKS;
+    wc.lpfnWndProc = ViewProc;
+    wc.hInstance = GetModuleHandleA(nullptr);
+    wc.hCursor = LoadCursor(nullptr, IDC_CROSS);
+    wc.lpszClassName = ViewClassName;
+    RegisterClassA(&wc);
+    registered = true;
+}
+}  // namespace
+
+HWND CreateViewWindow(HWND parent, int width, int height, ViewMessageHandler handler, void* owner)
+{
+    RegisterViewClass();
+    auto* hook = new ViewHook{handler, owner};
+    DWORD style = WS_CLIPCHILDREN | WS_CLIPSIBLINGS | (parent ? WS_CHILD | WS_VISIBLE : WS_OVERLAPPEDWINDOW);
+    RECT r = {0, 0, width, height};
+    AdjustWindowRect(&r, style, FALSE);
+    HWND hwnd = CreateWindowA(ViewClassName, "karvel viewer", style, 0, 0, r.right - r.left, r.bottom - r.top, parent,
+                              nullptr, GetModuleHandleA(nullptr), hook);
+    if (!hwnd)
+        delete hook;
+    return hwnd;
+}
+
+ModelView::ModelView(HWND window) : hwnd(window), dc(GetDC(window)) {}
+
+ModelView::~ModelView()
+{
+    modeller.Finalize();
+    ReleaseDC(hwnd, dc);
+}
+
+bool ModelView::Start(Scene& scene)
+{
+    AddSceneModel(modeller, scene, names);
+    modeller.Initialize(dc);
+    // NOTE: Initialize reports success even when no context could be made; only the current
+    // context tells.
+    if (!modeller.GetCurrent())
+        return false;
+    ApplySceneView(modeller, scene);
+    return true;
+}
+
+void ModelView::Draw() { modeller.DrawModel(dc); }
+
+std::vector<PickedEntity> ModelView::Pick(int x, int y, DorVector3& point, _DorPosition*& nearest)
+{
+    CDorArray<_VelSelect, _VelSelect&> hits;
+    modeller.HitTest(dc, x, y, hits);
+    std::vector<PickedEntity> picked;
+    for (int i = 0; i < hits.GetSize(); ++i) {
+        auto name = names.find(hits[i].position);
+        picked.push_back({name != names.end() ? name->second : "(unnamed)", hits[i].depth});
+    }
+    nearest = hits.GetSize() > 0 ? hits[0].position : nullptr;
+    if (nearest) {
+        double depth = hits[0].depth;
+        modeller.GetDepthToPoint3_Hi(dc, nearest, x, y, depth, point);
+    }
+    // NOTE: picking leaves the back buffer cleared; redraw so the window shows the model again.
+    Draw();
+    return picked;
+}
+
+bool ModelView::Capture(int width, int height, _DorBitmap& bitmap)
+{
+    _DORRECT rect = {0, 0, width, height};
+    modeller.ToBitmap(bitmap, rect);
+    return bitmap.info.width == width && bitmap.info.height == height && bitmap.info.bitCount == 24 &&
+           bitmap.bits.GetSize() >= DorBitmapRowBytes(width, 24) * height;
+}
+
+void ModelView::FollowWindowSize() { modeller.Initialize(dc); }

@@ -1,0 +1,176 @@
+// The viewer program as a user runs it in batch mode: its exit code, what it prints and the
+// files it writes. Each test starts karvel_viewer.exe as a separate process.
+#include <gtest/gtest.h>
+#include <windows.h>
+
+#include <algorithm>
+#include <fstream>
+#include <iterator>
+#include <regex>
+
+#define STB_IMAGE_IMPLEMENTATION
+#include <stb/stb_image.h>
+
+#include "examples/viewer_test_support.h"
+
+using viewer_test::BmpFile;
+using viewer_test::ScratchDir;
+
+namespace {
+struct ViewerRun {
+    DWORD exitCode;
+    std::string output;  // standard output and error together
+};
+
+ViewerRun RunViewer(const std::string& arguments)
+{
+    SECURITY_ATTRIBUTES inherit = {sizeof(inherit), nullptr, TRUE};
+    HANDLE readEnd = nullptr, writeEnd = nullptr;
+    CreatePipe(&readEnd, &writeEnd, &inherit, 0);
+    SetHandleInformation(readEnd, HANDLE_FLAG_INHERIT, 0);
+    STARTUPINFOA startup = {};
+    startup.cb = sizeof(startup);
+    startup.dwFlags = STARTF_USESTDHANDLES;
+    startup.hStdOutput = startup.hStdError = writeEnd;
+    startup.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
+    PROCESS_INFORMATION process = {};
+    std::string command = std::string("\"") + KARVEL_VIEWER_EXE + "\" " + arguments;
+    ViewerRun run = {~0u, ""};
+    BOOL started = CreateProcessA(nullptr, &command[0], nullptr, nullptr, TRUE, 0, nullptr, nullptr, &startup, &process);
+    CloseHandle(writeEnd);
+    if (!started) {
+        CloseHandle(readEnd);
+        run.output = "could not start " + command;
+        return run;
+    }
+    char buffer[4096];
+    DWORD got = 0;
+    while (ReadFile(readEnd, buffer, sizeof buffer, &got, nullptr) && got > 0)
+        run.output.append(buffer, got);
+    WaitForSingleObject(process.hProcess, INFINITE);
+    GetExitCodeProcess(process.hProcess, &run.exitCode);
+    CloseHandle(process.hProcess);
+    CloseHandle(process.hThread);
+    CloseHandle(readEnd);
+    return run;
+}
+
+std::string Quoted(const std::string& path) { return "\"" + path + "\""; }
+
+bool Exists(const std::string& path) { return GetFileAttributesA(path.c_str()) != INVALID_FILE_ATTRIBUTES; }
+
+// A red box in front of a grey plate on a blue background, seen straight from -y: the box
+// covers the middle of the picture, the plate a wider band behind it.
+const char* kBoxScene = R"({"background": [0, 0, 1],
+  "camera": {"eye": [0, -10, 0], "target": [0, 0, 0], "fovy": 40, "near": 1, "far": 100},
+  "entities": [
+    {"name": "red box", "type": "extrusion", "profile": [[-1, -1, -1], [1, -1, -1], [1, 1, -1], [-1, 1, -1]],
+     "extrude": [0, 0, 2], "material": {"color": [1, 0, 0]}},
+    {"name": "back plate", "type": "extrusion", "profile": [[-2.5, 3, -2], [2.5, 3, -2], [2.5, 3.5, -2], [-2.5, 3.5, -2]],
+     "extrude": [0, 0, 4], "material": {"color": [0.6, 0.6, 0.6]}}]})";
+
+class ViewerBatch : public ::testing::Test {
+protected:
+    ScratchDir dir{"viewer_batch_test"};
+    std::string scene = dir.Path("box.json");
+
+    void SetUp() override { dir.Write("box.json", std::string(kBoxScene)); }
+};
+}  // namespace
+
+TEST_F(ViewerBatch, SnapshotHasTheRequestedSizeAndTheSceneAtKnownPixels)
+{
+    std::string png = dir.Path("box.png");
+    ViewerRun run = RunViewer(Quoted(scene) + " --snapshot " + Quoted(png) + " --size 320x240");
+    ASSERT_EQ(run.exitCode, 0u) << run.output;
+    int width = 0, height = 0, channels = 0;
+    unsigned char* pixels = stbi_load(png.c_str(), &width, &height, &channels, 3);
+    ASSERT_NE(pixels, nullptr) << run.output;
+    EXPECT_EQ(width, 320);
+    EXPECT_EQ(height, 240);
+    auto at = [&](int x, int y) { return pixels + (y * width + x) * 3; };
+    const unsigned char* middle = at(160, 120);  // the box's lit front
+    EXPECT_GT(middle[0], 120) << int(middle[0]) << "," << int(middle[1]) << "," << int(middle[2]);
+    EXPECT_LT(middle[1], 40);
+    EXPECT_LT(middle[2], 40);
+    const unsigned char* corner = at(5, 5);  // background
+    EXPECT_EQ(corner[0], 0);
+    EXPECT_EQ(corner[1], 0);
+    EXPECT_EQ(corner[2], 255);
+    stbi_image_free(pixels);
+}
+
+TEST_F(ViewerBatch, PickNamesTheEntitiesNearestFirstAndThePointOnTheNearest)
+{
+    ViewerRun run = RunViewer(Quoted(scene) + " --pick 160,120 --size 320x240");
+    ASSERT_EQ(run.exitCode, 0u) << run.output;
+    size_t box = run.output.find("1. red box");
+    ASSERT_NE(box, std::string::npos) << run.output;
+    size_t plate = run.output.find("2. back plate");
+    EXPECT_NE(plate, std::string::npos) << run.output;
+    std::smatch point;
+    ASSERT_TRUE(std::regex_search(run.output, point, std::regex(R"(point \(([-0-9.]+), ([-0-9.]+), ([-0-9.]+)\))")))
+        << run.output;
+    EXPECT_NEAR(std::stod(point[1]), 0.0, 0.05);
+    EXPECT_NEAR(std::stod(point[2]), -1.0, 0.05);  // on the box's front face
+    EXPECT_NEAR(std::stod(point[3]), 0.0, 0.05);
+
+    ViewerRun empty = RunViewer(Quoted(scene) + " --pick 5,5 --size 320x240");
+    EXPECT_EQ(empty.exitCode, 0u);
+    EXPECT_NE(empty.output.find("pick 5,5: no entity"), std::string::npos) << empty.output;
+}
+
+TEST_F(ViewerBatch, OrbitMovieHasEveryFrame)
+{
+    std::string avi = dir.Path("orbit.avi");
+    ViewerRun run = RunViewer(Quoted(scene) + " --movie " + Quoted(avi) + " --frames 4 --fps 2 --size 160x120");
+    ASSERT_EQ(run.exitCode, 0u) << run.output;
+    EXPECT_NE(run.output.find("frame 4/4"), std::string::npos) << run.output;
+    std::ifstream file(avi, std::ios::binary);
+    std::string bytes((std::istreambuf_iterator<char>(file)), std::istreambuf_iterator<char>());
+    ASSERT_GT(bytes.size(), 12u);
+    EXPECT_EQ(bytes.substr(0, 4), "RIFF");
+    EXPECT_EQ(bytes.substr(8, 4), "AVI ");
+    size_t frameBytes = 160 * 3 * 120;
+    EXPECT_GE(bytes.size(), 4 * frameBytes);
+    EXPECT_LT(bytes.size(), 5 * frameBytes);
+}
+
+TEST_F(ViewerBatch, SceneErrorsStopWithOneMessageAndNoPicture)
+{
+    dir.Write("bad.bmp", std::string("no picture"));
+    struct Case {
+        const char* file;
+        std::string text;
+        std::string message;
+    };
+    std::vector<Case> cases = {
+        {"syntax.json", "{\"camera\": }", ": line 1, column 12: expected valid JSON"},
+        {"missing.json", R"({"camera": {"eye": [0, -5, 0], "target": [0, 0, 0]}})",
+         ": top level: expected \"entities\" (an array of entities)"},
+        {"type.json",
+         R"({"camera": {"eye": [0, -5, 0], "target": [0, 0, "far"]}, "entities": []})",
+         ": camera.target[2]: expected a number, found the string \"far\""},
+        {"texture.json",
+         R"({"camera": {"eye": [0, -5, 0], "target": [0, 0, 0]}, "entities": [{"name": "t", "type": "extrusion",
+            "profile": [[0,0,0],[1,0,0],[0,1,0]], "extrude": [0,0,1], "texture": {"file": "bad.bmp"}}]})",
+         ": entities[0] (\"t\").texture.file: expected a BMP file"},
+    };
+    for (const Case& c : cases) {
+        dir.Write(c.file, c.text);
+        std::string png = dir.Path("never.png");
+        ViewerRun run = RunViewer(Quoted(dir.Path(c.file)) + " --snapshot " + Quoted(png));
+        EXPECT_EQ(run.exitCode, 1u) << c.file;
+        EXPECT_EQ(run.output.find(dir.Path(c.file) + c.message), 0u) << c.file << ": " << run.output;
+        EXPECT_EQ(std::count(run.output.begin(), run.output.end(), '\n'), 1) << run.output;
+        EXPECT_FALSE(Exists(png)) << c.file;
+    }
+}
+
+TEST_F(ViewerBatch, CommandLineMistakesShowTheUsage)
+{
+    ViewerRun run = RunViewer(Quoted(scene) + " --size 10x10");
+    EXPECT_EQ(run.exitCode, 2u);
+    EXPECT_NE(run.output.find("--size expects WxH"), std::string::npos) << run.output;
+    EXPECT_NE(run.output.find("usage: karvel_viewer"), std::string::npos) << run.output;
+}
