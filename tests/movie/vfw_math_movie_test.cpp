@@ -14,6 +14,7 @@
 
 #include "model/dor_bitmap.h"
 #include "movie/vfw_math_movie.h"
+#include "support/gdi_test_bitmap.h"
 
 namespace {
 
@@ -117,6 +118,53 @@ AviContents ReadAvi(const std::string& path)
     ReadChunks(d, 12, std::min<size_t>(d.size(), 8 + size_t(U32(d, 4))), out);
     return out;
 }
+
+// Answers the compressor dialog that this thread is about to show: a helper thread waits for
+// the dialog and presses one of its buttons, as a user would.
+class DialogAnswer {
+public:
+    explicit DialogAnswer(int button) : owner_(GetCurrentThreadId()), button_(button), thread_([this] { Wait(); }) {}
+    ~DialogAnswer()
+    {
+        stop_ = true;
+        thread_.join();
+    }
+    bool Answered() const { return answered_; }
+
+private:
+    static BOOL CALLBACK FindDialog(HWND hwnd, LPARAM found)
+    {
+        char name[16] = {};
+        GetClassNameA(hwnd, name, sizeof(name));
+        if (std::strcmp(name, "#32770") != 0 || !IsWindowVisible(hwnd))
+            return TRUE;
+        *reinterpret_cast<HWND*>(found) = hwnd;
+        return FALSE;
+    }
+
+    void Wait()
+    {
+        for (int waited = 0; waited < 10000 && !stop_; waited += 20) {
+            HWND dialog = nullptr;
+            EnumThreadWindows(owner_, FindDialog, reinterpret_cast<LPARAM>(&dialog));
+            if (dialog) {
+                if (HWND list = FindWindowExA(dialog, nullptr, "ComboBox", nullptr))
+                    SendMessageA(list, CB_SETCURSEL, 0, 0);  // the first choice: full frames, uncompressed
+                PostMessageA(dialog, WM_COMMAND, MAKEWPARAM(button_, BN_CLICKED),
+                             reinterpret_cast<LPARAM>(GetDlgItem(dialog, button_)));
+                answered_ = true;
+                return;
+            }
+            Sleep(20);
+        }
+    }
+
+    DWORD owner_;
+    int button_;
+    std::atomic<bool> stop_{false};
+    std::atomic<bool> answered_{false};
+    std::thread thread_;  // last: starts once the rest is set
+};
 
 // A fresh path in the temporary folder, removed again after the test.
 class MovieFile : public ::testing::Test {
@@ -274,4 +322,93 @@ TEST_F(MovieFile, RecorderDestroyedWhileRecordingClosesItsFile)
     }
     ExpectFrames(ReadAvi(path), frames);
     EXPECT_TRUE(DeleteFileA(path.c_str()));  // nothing holds it open any more
+}
+
+TEST_F(MovieFile, CancelledCompressorDialogLeavesTheRecorderIdle)
+{
+    _DorBitmap frame = PatternFrame(16, 16, 24, 0);
+    CVelMathMovie movie;
+    int started;
+    {
+        DialogAnswer cancel(IDCANCEL);
+        started = movie.Start(frame, path.c_str(), 25, "x", 1);
+        ASSERT_TRUE(cancel.Answered());
+    }
+    EXPECT_EQ(started, 0);
+    EXPECT_EQ(movie.IsStart(), 0);
+    EXPECT_EQ(movie.Add(frame), 0);
+    ASSERT_TRUE(Exists());  // created before the dialog, and left empty
+    EXPECT_FALSE(ReadAvi(path).riff);
+}
+
+TEST_F(MovieFile, FullFramesChosenInTheDialogWritesAReadableMovie)
+{
+    std::vector<_DorBitmap> frames = {PatternFrame(30, 20, 24, 1), PatternFrame(30, 20, 24, 2),
+                                      PatternFrame(30, 20, 24, 3)};
+    CVelMathMovie movie;
+    {
+        DialogAnswer confirm(IDOK);
+        ASSERT_EQ(movie.Start(frames[0], path.c_str(), 12, "Zoom", 3), 1);
+        ASSERT_TRUE(confirm.Answered());
+    }
+    EXPECT_EQ(movie.IsStart(), 1);
+    EXPECT_EQ(movie.compressor.fccHandler, mmioFOURCC('D', 'I', 'B', ' '));
+    _DorBitmap wider = PatternFrame(31, 20, 24, 9);
+    for (_DorBitmap& f : frames) {
+        EXPECT_EQ(movie.Add(f), 1);
+        EXPECT_EQ(movie.Add(wider), 0);
+    }
+    EXPECT_EQ(movie.frame, 3);
+    movie.End();
+    EXPECT_EQ(movie.IsStart(), 0);
+    AviContents avi = ReadAvi(path);
+    ExpectFrames(avi, frames);
+    EXPECT_EQ(avi.rate / avi.scale, 12u);
+    EXPECT_EQ(avi.name, "Z");
+    EXPECT_EQ(avi.fccHandler, mmioFOURCC('D', 'I', 'B', ' '));
+}
+
+TEST_F(MovieFile, CompressedRecorderDestroyedWhileRecordingClosesItsFile)
+{
+    std::vector<_DorBitmap> frames = {PatternFrame(8, 8, 32, 1)};
+    {
+        CVelMathMovie movie;
+        DialogAnswer confirm(IDOK);
+        ASSERT_EQ(movie.Start(frames[0], path.c_str(), 5, "d", 1), 1);
+        ASSERT_EQ(movie.Add(frames[0]), 1);
+    }
+    ExpectFrames(ReadAvi(path), frames);
+    EXPECT_TRUE(DeleteFileA(path.c_str()));
+}
+
+TEST_F(MovieFile, GdiBitmapsAreRecordedAtTheirOwnSizeAndDepth)
+{
+    // Rows without padding: GDI does not keep what a frame holds past the pixels of a row.
+    std::vector<_DorBitmap> frames = {PatternFrame(28, 14, 8, 1), PatternFrame(28, 14, 8, 2)};
+    HBITMAP first = CreateDibSectionOf(frames[0]);
+    HBITMAP second = CreateDibSectionOf(frames[1]);
+    HBITMAP wider = CreateDibSectionOf(PatternFrame(29, 14, 8, 3));
+    HBITMAP deeper = CreateDibSectionOf(PatternFrame(28, 14, 24, 4));
+    CVelMathMovie_NoComp movie;
+    ASSERT_EQ(movie.Start(first, path.c_str(), 20, "g", 2), 1);
+    EXPECT_EQ(movie.Add(first), 1);
+    EXPECT_EQ(movie.Add(wider), 0);
+    EXPECT_EQ(movie.Add(deeper), 0);
+    EXPECT_EQ(movie.Add(static_cast<HBITMAP>(nullptr)), 0);
+    EXPECT_EQ(movie.Add(second), 1);
+    movie.End();
+    for (HBITMAP b : {first, second, wider, deeper})
+        DeleteObject(b);
+
+    AviContents avi = ReadAvi(path);
+    ExpectFrames(avi, frames);
+    ASSERT_EQ(avi.format.size(), sizeof(BITMAPINFOHEADER) + 256 * sizeof(RGBQUAD));
+    EXPECT_EQ(std::memcmp(avi.format.data() + sizeof(BITMAPINFOHEADER), frames[0].palette.GetData(), 1024), 0);
+}
+
+TEST_F(MovieFile, NoGdiBitmapStartsNothing)
+{
+    CVelMathMovie_NoComp movie;
+    EXPECT_EQ(movie.Start(static_cast<HBITMAP>(nullptr), path.c_str(), 20, "n", 1), 0);
+    EXPECT_EQ(movie.IsStart(), 0);
 }
