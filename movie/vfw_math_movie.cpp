@@ -10,6 +10,20 @@
 static_assert(sizeof(VelAviStreamInfo) == sizeof(AVISTREAMINFOA), "stream info differs from AVIFile's");
 static_assert(offsetof(VelAviStreamInfo, frameLeft) == offsetof(AVISTREAMINFOA, rcFrame), "stream info differs");
 static_assert(offsetof(VelAviStreamInfo, name) == offsetof(AVISTREAMINFOA, szName), "stream info differs");
+#if defined(__GNUC__)
+// NOTE: offsetof on a class with a virtual table is conditionally supported; GCC, Clang and MSVC
+// all give the real offset.
+#  pragma GCC diagnostic ignored "-Winvalid-offsetof"
+#endif
+// The recorders' fields are part of the binary interface: hosts allocate them.
+static_assert(offsetof(CVelMathMovie, format) == sizeof(void*), "recorder layout changed");
+static_assert(offsetof(CVelMathMovie, file) == sizeof(void*) + 40, "recorder layout changed");
+static_assert(offsetof(CVelMathMovie, compressedStream) == 3 * sizeof(void*) + 40, "recorder layout changed");
+static_assert(offsetof(CVelMathMovie, frame) == 4 * sizeof(void*) + 40, "recorder layout changed");
+static_assert(offsetof(CVelMathMovie, compressor) == 4 * sizeof(void*) + 48, "recorder layout changed");
+static_assert(offsetof(CVelMathMovie_NoComp, frame) == 3 * sizeof(void*) + 40, "recorder layout changed");
+static_assert(offsetof(CVelMathMovie_NoComp, started) == 3 * sizeof(void*) + 44, "recorder layout changed");
+
 static_assert(kVelCompressDataRate == AVICOMPRESSF_DATARATE && kVelCompressKeyFrames == AVICOMPRESSF_KEYFRAMES,
               "compression flags differ from AVIFile's");
 
