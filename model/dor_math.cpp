@@ -3,8 +3,6 @@
 #include <cmath>
 
 namespace {
-const double kPi = 3.14159265358979323846;
-
 double Snap(double v) { return std::fabs(v) < 1e-6 ? 0.0 : v; }
 }  // namespace
 
@@ -43,16 +41,22 @@ DorDirectionKind DorDirectionAngles(const DorVector3& d, double& elevation, doub
     if (d.x != 0.0) {
         azimuth = std::atan(d.y / d.x);
         if (d.x < 0.0)
-            azimuth += kPi;
+            azimuth += DorPi;
     } else if (d.y < 0.0) {
-        azimuth = -kPi / 2;
+        azimuth = -DorPi / 2;
     } else if (d.y > 0.0) {
-        azimuth = kPi / 2;
+        azimuth = DorPi / 2;
     } else {
         azimuth = 0.0;
         return DorDirectionVertical;
     }
     return DorDirectionSloped;
+}
+
+double DorAzimuth(const DorVector3& d)
+{
+    double elevation = 0.0, azimuth = 0.0;
+    return DorDirectionAngles(d, elevation, azimuth) == DorDirectionTooShort ? 0.0 : azimuth;
 }
 
 DorMatrix4x4 DorRotateX(double a)
@@ -106,6 +110,49 @@ DorMatrix4x4 operator*(const DorMatrix4x4& a, const DorMatrix4x4& b)
     return r;
 }
 
+bool DorTruncateToInt(double value, int& out)
+{
+    if (!(value > -2147483649.0 && value < 2147483648.0))
+        return false;
+    out = static_cast<int>(value);
+    return true;
+}
+
+namespace {
+// Determinant of the 3x3 matrix left when row `row` and column `column` are struck out.
+double Minor(const DorMatrix4x4& matrix, int row, int column)
+{
+    int rows[3], columns[3];
+    for (int i = 0, k = 0; i < 4; ++i)
+        if (i != row)
+            rows[k++] = i;
+    for (int j = 0, k = 0; j < 4; ++j)
+        if (j != column)
+            columns[k++] = j;
+    auto at = [&](int i, int j) { return matrix.m[rows[i]][columns[j]]; };
+    return at(0, 0) * (at(1, 1) * at(2, 2) - at(1, 2) * at(2, 1)) -
+           at(0, 1) * (at(1, 0) * at(2, 2) - at(1, 2) * at(2, 0)) +
+           at(0, 2) * (at(1, 0) * at(2, 1) - at(1, 1) * at(2, 0));
+}
+}  // namespace
+
+bool DorInvert(const DorMatrix4x4& matrix, double minDeterminant, DorMatrix4x4& out)
+{
+    DorMatrix4x4 adjugate;  // the transposed cofactors
+    for (int r = 0; r < 4; ++r)
+        for (int c = 0; c < 4; ++c)
+            adjugate.m[c][r] = ((r + c) % 2 ? -1.0 : 1.0) * Minor(matrix, r, c);
+    double determinant = 0.0;
+    for (int c = 0; c < 4; ++c)
+        determinant += matrix.m[0][c] * adjugate.m[c][0];
+    if (!(std::fabs(determinant) >= minDeterminant) || !std::isfinite(determinant))
+        return false;
+    for (int r = 0; r < 4; ++r)
+        for (int c = 0; c < 4; ++c)
+            out.m[r][c] = adjugate.m[r][c] / determinant;
+    return true;
+}
+
 DorVector3 DorTransformPoint(const DorVector3& p, const DorMatrix4x4& m)
 {
     return DorVector3(p.x * m.m[0][0] + p.y * m.m[1][0] + p.z * m.m[2][0] + m.m[3][0],
@@ -126,9 +173,9 @@ DorMatrix4x4 DorPlaneProjection(const DorVector3& normal, const DorVector3& anch
     double elevation = 0, azimuth = 0;
     switch (DorDirectionAngles(normal, elevation, azimuth)) {
     case DorDirectionSloped:
-        return translation * (DorRotateZ(-kPi / 2 - azimuth) * DorRotateX(elevation - kPi / 2));
+        return translation * (DorRotateZ(-DorPi / 2 - azimuth) * DorRotateX(elevation - DorPi / 2));
     case DorDirectionVertical:
-        return translation * DorRotateY(kPi / 2 - elevation);
+        return translation * DorRotateY(DorPi / 2 - elevation);
     default:
         return translation;
     }

@@ -4,6 +4,8 @@
 #include "model/dor_types.h"
 #include "model/export.h"
 
+const double DorPi = 3.14159265358979323846;
+
 inline DorVector3 operator+(const DorVector3& a, const DorVector3& b) { return DorVector3(a.x + b.x, a.y + b.y, a.z + b.z); }
 inline DorVector3 operator-(const DorVector3& a, const DorVector3& b) { return DorVector3(a.x - b.x, a.y - b.y, a.z - b.z); }
 inline DorVector3 operator*(const DorVector3& a, double s) { return DorVector3(a.x * s, a.y * s, a.z * s); }
@@ -26,12 +28,21 @@ enum DorDirectionKind { DorDirectionTooShort = 0, DorDirectionSloped = 1, DorDir
 // Elevation asin(z/|d|) and azimuth of d in radians. The azimuth is atan(y/x), plus pi for x < 0,
 // +-pi/2 for x = 0; a vertical direction (x = y = 0) gets azimuth 0.
 KARVEL_API DorDirectionKind DorDirectionAngles(const DorVector3& d, double& elevation, double& azimuth);
+// The azimuth of DorDirectionAngles, or 0 when d is too short to give one.
+KARVEL_API double DorAzimuth(const DorVector3& d);
 
 KARVEL_API DorMatrix4x4 DorRotateX(double radians);
 KARVEL_API DorMatrix4x4 DorRotateY(double radians);
 KARVEL_API DorMatrix4x4 DorRotateZ(double radians);
 KARVEL_API DorMatrix4x4 DorTranslate(double x, double y, double z);
 KARVEL_API DorMatrix4x4 operator*(const DorMatrix4x4& a, const DorMatrix4x4& b);
+
+// Truncates toward zero into an int; false (out untouched) for NaN or a value no int holds.
+KARVEL_API bool DorTruncateToInt(double value, int& out);
+
+// Inverse as the adjugate over the determinant; false (out untouched) when |determinant| is
+// below minDeterminant or not finite.
+KARVEL_API bool DorInvert(const DorMatrix4x4& m, double minDeterminant, DorMatrix4x4& out);
 
 KARVEL_API DorVector3 DorTransformPoint(const DorVector3& p, const DorMatrix4x4& m);
 // The rotation part only: no translation.

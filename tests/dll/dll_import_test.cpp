@@ -2,8 +2,10 @@
 // the DLL boundary (allocation on one side, release on the other).
 #include <gtest/gtest.h>
 
+#include "convert/dor_shape.h"
 #include "movie/vfw_math_movie.h"
 #include "primitives/vel_math_primitive.h"
+#include "tests/support/recording_karvel.h"
 
 TEST(KarvelDll, PrimitiveBuiltInsideTheDllIsCopiedAndFreedByTheHost)
 {
@@ -13,6 +15,35 @@ TEST(KarvelDll, PrimitiveBuiltInsideTheDllIsCopiedAndFreedByTheHost)
     ASSERT_EQ(copy.groups.GetSize(), 1);
     EXPECT_EQ(copy.groups[0].vertices.GetSize(), 20);
     EXPECT_EQ(copy.groups[0].vertices[19].position.y, 4.0);
+}
+
+// A host's own modeller, derived from the exported interface: the camera wrappers inside the DLL
+// call back into the host's GetCamera and SetCamera through the virtual table.
+TEST(KarvelDll, CameraWrappersCallBackIntoAHostModeller)
+{
+    RecordingKarvel host;
+    host.camera.eye = DorVector3(10, 0, 0);
+    host.camera.target = DorVector3(0, 0, 0);
+    CVelKarvel& modeller = host;
+    modeller.RoundDolly(0, 90);
+    EXPECT_EQ(host.getCameraCalls, 1);
+    EXPECT_EQ(host.setCameraCalls, 1);
+    EXPECT_EQ(host.camera.eye.y, 10.0);
+    EXPECT_EQ(modeller.GetCullMode(), 1);
+}
+
+TEST(KarvelDll, ShapeBuiltByTheHostIsConvertedInsideTheDll)
+{
+    CDorExtruded box(CDorPolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(1, 1, 0), DorVector3(0, 1, 0)}),
+                     DorVector3(0, 0, 1));
+    CDorShape shape;
+    shape.Add(&box);
+    RecordingKarvel host;
+    _DorPosition* entity = host.AddShape(shape);
+    ASSERT_EQ(host.entities.count(entity), 1u);
+    const CVelPrimitive& primitive = host.entities[entity];
+    ASSERT_EQ(primitive.groups.GetSize(), 6);  // the kind check recognises the host's object
+    EXPECT_EQ(primitive.groups[5].vertices[0].normal.z, 1.0);
 }
 
 TEST(KarvelDll, RecordersAreExported)

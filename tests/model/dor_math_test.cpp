@@ -85,3 +85,49 @@ TEST(PlaneProjection, AnchorToExactOriginAndNormalToPlusZWhateverTheRotation)
     DorVector3 turned = DorTransformDirection(down, DorPlaneProjection(down, DorVector3()));
     EXPECT_EQ(turned.z, 1.0);  // the vertical case uses the single Y rotation
 }
+
+TEST(Invert, UndoesARigidMoveAndRefusesSingularMatrices)
+{
+    DorMatrix4x4 m = DorTranslate(3, -2, 7) * DorRotateX(0.4) * DorRotateZ(-1.1) * DorTranslate(0, 0, 5);
+    DorMatrix4x4 inverse;
+    ASSERT_TRUE(DorInvert(m, 1e-7, inverse));
+    DorVector3 p(1.5, -0.25, 4);
+    DorVector3 back = DorTransformPoint(DorTransformPoint(p, m), inverse);
+    EXPECT_NEAR(back.x, p.x, 1e-12);
+    EXPECT_NEAR(back.y, p.y, 1e-12);
+    EXPECT_NEAR(back.z, p.z, 1e-12);
+
+    DorMatrix4x4 scaled;  // determinant 2 * 3 * 4 = 24: the inverse divides by each scale
+    scaled.m[0][0] = 2;
+    scaled.m[1][1] = 3;
+    scaled.m[2][2] = 4;
+    ASSERT_TRUE(DorInvert(scaled, 1e-7, inverse));
+    EXPECT_DOUBLE_EQ(inverse.m[1][1], 1.0 / 3.0);
+
+    DorMatrix4x4 flat;
+    flat.m[2][2] = 0;  // squashes z: no inverse
+    DorMatrix4x4 untouched = DorTranslate(9, 9, 9);
+    EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
+    EXPECT_EQ(untouched.m[3][0], 9.0);
+    flat.m[2][2] = 1e-8;  // below the threshold
+    EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
+    flat.m[2][2] = std::nan("");
+    EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
+}
+
+TEST(TruncateToInt, TowardZeroWithinIntRangeOnly)
+{
+    int out = 7;
+    EXPECT_TRUE(DorTruncateToInt(-2.9, out));
+    EXPECT_EQ(out, -2);
+    EXPECT_TRUE(DorTruncateToInt(2147483647.9, out));
+    EXPECT_EQ(out, 2147483647);
+    EXPECT_TRUE(DorTruncateToInt(-2147483648.9, out));
+    EXPECT_EQ(out, -2147483647 - 1);
+    out = 7;
+    EXPECT_FALSE(DorTruncateToInt(2147483648.0, out));
+    EXPECT_FALSE(DorTruncateToInt(-2147483649.0, out));
+    EXPECT_FALSE(DorTruncateToInt(std::nan(""), out));
+    EXPECT_FALSE(DorTruncateToInt(-HUGE_VAL, out));
+    EXPECT_EQ(out, 7);
+}

@@ -1,0 +1,6 @@
+#include "camera/vel_clock.h"
+
+#include <windows.h>
+#include <mmsystem.h>
+
+unsigned int VelClockMilliseconds() { return timeGetTime(); }
