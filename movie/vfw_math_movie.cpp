@@ -4,25 +4,26 @@
 #include <cstdio>
 #include <cstring>
 
+#include "model/dor_layout_check.h"
 #include "movie/gdi_frame.h"
 #include "movie/vel_movie_format.h"
 
 static_assert(sizeof(VelAviStreamInfo) == sizeof(AVISTREAMINFOA), "stream info differs from AVIFile's");
 static_assert(offsetof(VelAviStreamInfo, frameLeft) == offsetof(AVISTREAMINFOA, rcFrame), "stream info differs");
 static_assert(offsetof(VelAviStreamInfo, name) == offsetof(AVISTREAMINFOA, szName), "stream info differs");
-#if defined(__GNUC__)
-// NOTE: offsetof on a class with a virtual table is conditionally supported; GCC, Clang and MSVC
-// all give the real offset.
-#  pragma GCC diagnostic ignored "-Winvalid-offsetof"
-#endif
-// The recorders' fields are part of the binary interface: hosts allocate them.
-static_assert(offsetof(CVelMathMovie, format) == sizeof(void*), "recorder layout changed");
-static_assert(offsetof(CVelMathMovie, file) == sizeof(void*) + 40, "recorder layout changed");
-static_assert(offsetof(CVelMathMovie, compressedStream) == 3 * sizeof(void*) + 40, "recorder layout changed");
-static_assert(offsetof(CVelMathMovie, frame) == 4 * sizeof(void*) + 40, "recorder layout changed");
-static_assert(offsetof(CVelMathMovie, compressor) == 4 * sizeof(void*) + 48, "recorder layout changed");
-static_assert(offsetof(CVelMathMovie_NoComp, frame) == 3 * sizeof(void*) + 40, "recorder layout changed");
-static_assert(offsetof(CVelMathMovie_NoComp, started) == 3 * sizeof(void*) + 44, "recorder layout changed");
+
+// The recorders' fields are part of the binary interface: hosts allocate the recorders.
+KARVEL_FIELD(CVelMathMovie, format, KARVEL_PICK(4, 8));
+KARVEL_FIELD(CVelMathMovie, file, KARVEL_PICK(44, 48));
+KARVEL_FIELD(CVelMathMovie, stream, KARVEL_PICK(48, 56));
+KARVEL_FIELD(CVelMathMovie, compressedStream, KARVEL_PICK(52, 64));
+KARVEL_FIELD(CVelMathMovie, frame, KARVEL_PICK(56, 72));
+KARVEL_FIELD(CVelMathMovie, started, KARVEL_PICK(60, 76));
+KARVEL_FIELD(CVelMathMovie, compressor, KARVEL_PICK(64, 80));
+KARVEL_FIELD(CVelMathMovie_NoComp, file, KARVEL_PICK(44, 48));
+KARVEL_FIELD(CVelMathMovie_NoComp, stream, KARVEL_PICK(48, 56));
+KARVEL_FIELD(CVelMathMovie_NoComp, frame, KARVEL_PICK(52, 64));
+KARVEL_FIELD(CVelMathMovie_NoComp, started, KARVEL_PICK(56, 68));
 
 static_assert(kVelCompressDataRate == AVICOMPRESSF_DATARATE && kVelCompressKeyFrames == AVICOMPRESSF_KEYFRAMES,
               "compression flags differ from AVIFile's");
