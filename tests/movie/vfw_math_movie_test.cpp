@@ -1,5 +1,7 @@
-// Records movies into temporary files and reads them back through AVIFile: frame count, size,
-// rate, the stream's name, the format block and the pixels of every frame.
+// Records movies into temporary files and reads them back chunk by chunk, as a player does:
+// frame count, size, rate, the stream's name, the format block and the pixels of every frame.
+// NOTE: 64-bit Wine's AVIFileOpenA cannot read these files back (it fails with AVIERR_BADFORMAT
+// looking for the main header), so the RIFF chunks are parsed here instead.
 #include <gtest/gtest.h>
 #include <windows.h>
 #include <vfw.h>
