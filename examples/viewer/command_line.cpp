@@ -1,12 +1,11 @@
 #include "command_line.h"
 
 #include <cstdlib>
-#include <limits>
 
 namespace {
-// Window sizes: Wine refuses narrower windows than 160 pixels; beyond 4096 no texture-sized
-// capture is useful and DIB sections may fail.
-const int MinSize = 160, MaxSize = 4096;
+// NOTE: Wine widens top-level windows narrower than about 160 pixels, which would change the
+// picture's size; 4096 keeps a capture's DIB section well within what drivers allocate.
+const int MinWidth = 160, MinHeight = 120, MaxSize = 4096;
 
 // A whole decimal number from low to high, nothing else in the text.
 bool ParseInt(const std::string& text, int low, int high, int& out)
@@ -24,11 +23,11 @@ bool ParseInt(const std::string& text, int low, int high, int& out)
 }
 
 // "A<sep>B" with both parts whole numbers in range.
-bool ParsePair(const std::string& text, char sep, int low, int high, int& a, int& b)
+bool ParsePair(const std::string& text, char sep, int lowA, int lowB, int high, int& a, int& b)
 {
     size_t at = text.find(sep);
-    return at != std::string::npos && ParseInt(text.substr(0, at), low, high, a) &&
-           ParseInt(text.substr(at + 1), low, high, b);
+    return at != std::string::npos && ParseInt(text.substr(0, at), lowA, high, a) &&
+           ParseInt(text.substr(at + 1), lowB, high, b);
 }
 
 bool EndsWith(const std::string& text, const char* suffix)
@@ -99,9 +98,9 @@ bool ParseCommandLine(const std::vector<std::string>& args, ViewerOptions& optio
                 return false;
             }
         } else if (arg == "--size") {
-            if (!ParsePair(value, 'x', MinSize, MaxSize, options.width, options.height)) {
-                error = "--size expects WxH with W and H from " + std::to_string(MinSize) + " to " +
-                        std::to_string(MaxSize) + ", found " + value;
+            if (!ParsePair(value, 'x', MinWidth, MinHeight, MaxSize, options.width, options.height)) {
+                error = "--size expects WxH with W from " + std::to_string(MinWidth) + " and H from " +
+                        std::to_string(MinHeight) + " to " + std::to_string(MaxSize) + ", found " + value;
                 return false;
             }
         } else {
@@ -119,7 +118,7 @@ bool ParseCommandLine(const std::vector<std::string>& args, ViewerOptions& optio
     // The pick is checked last: it must lie inside the window of the final size.
     if (!pickText.empty()) {
         options.pick = true;
-        if (!ParsePair(pickText, ',', 0, std::numeric_limits<int>::max() / 2, options.pickX, options.pickY) ||
+        if (!ParsePair(pickText, ',', 0, 0, MaxSize, options.pickX, options.pickY) ||
             options.pickX >= options.width || options.pickY >= options.height) {
             error = "--pick expects X,Y inside the " + std::to_string(options.width) + "x" +
                     std::to_string(options.height) + " window, found " + pickText;

@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <cmath>
 #include <initializer_list>
 #include <map>
@@ -243,6 +244,33 @@ DorVector3 NewellNormal(const std::vector<DorVector3>& loop)
     return DorNewellNormal(loop.data(), static_cast<int>(loop.size()));
 }
 
+// Point 0 stays, the others reverse: the converters' own reordering, which keeps the pairing
+// of bottom and top points.
+void Reverse(std::vector<DorVector3>& loop)
+{
+    if (loop.size() > 2)
+        std::reverse(loop.begin() + 1, loop.end());
+}
+
+DorVector3 Centroid(const std::vector<DorVector3>& loop)
+{
+    DorVector3 sum;
+    for (const DorVector3& p : loop)
+        sum = sum + p;
+    return sum * (1.0 / static_cast<double>(loop.size()));
+}
+
+// Walls face outward only when the profiles run counter-clockwise about the extrusion; the
+// converters do not ensure it for an extrusion straight along y.
+void RunCounterClockwiseAbout(const DorVector3& direction, std::vector<DorVector3>& bottom,
+                              std::vector<DorVector3>& top)
+{
+    if (DorDot(NewellNormal(bottom), direction) < 0.0) {
+        Reverse(bottom);
+        Reverse(top);
+    }
+}
+
 // A hole's walls face into the opening only when it runs the outline's way round.
 void RunLikeOutline(std::vector<DorVector3>& hole, const std::vector<DorVector3>& outline)
 {
@@ -400,7 +428,6 @@ private:
             const Json& array = ReadArray(*list, Member(place, "holes"), 0, 100000, "an array of profiles");
             for (size_t h = 0; h < array.size(); ++h) {
                 holes.push_back(ReadProfile(array[h], Item(Member(place, "holes"), h)));
-                RunLikeOutline(holes.back(), profile);
             }
         }
         const Json* extrude = Find(value, "extrude");
@@ -412,18 +439,26 @@ private:
         if (top && !holes.empty())
             Fail(Member(place, "top"), "\"extrude\": a holed extrusion's top is its profile moved");
 
+        DorVector3 offset;
+        std::vector<DorVector3> topPoints;
+        if (extrude) {
+            offset = ReadDirection(*extrude, Member(place, "extrude"));
+            for (const DorVector3& p : profile)
+                topPoints.push_back(p + offset);
+        } else {
+            topPoints = ReadProfile(*top, Member(place, "top"));
+            if (topPoints.size() != profile.size())
+                Fail(Member(place, "top"), "as many points as the profile (" + std::to_string(profile.size()) +
+                                               "), found " + std::to_string(topPoints.size()));
+        }
+        RunCounterClockwiseAbout(Centroid(topPoints) - Centroid(profile), profile, topPoints);
+        for (std::vector<DorVector3>& hole : holes)
+            RunLikeOutline(hole, profile);
+
         CDorPolygon bottom(profile.data(), static_cast<int>(profile.size()));
         if (holes.empty()) {
-            std::unique_ptr<CDorExtruded> extruded;
-            if (extrude) {
-                extruded = std::make_unique<CDorExtruded>(bottom, ReadDirection(*extrude, Member(place, "extrude")));
-            } else {
-                std::vector<DorVector3> topPoints = ReadProfile(*top, Member(place, "top"));
-                if (topPoints.size() != profile.size())
-                    Fail(Member(place, "top"), "as many points as the profile (" + std::to_string(profile.size()) + "), found " +
-                                                   std::to_string(topPoints.size()));
-                extruded = std::make_unique<CDorExtruded>(bottom, CDorPolygon(topPoints.data(), static_cast<int>(topPoints.size())));
-            }
+            auto extruded = std::make_unique<CDorExtruded>(
+                bottom, CDorPolygon(topPoints.data(), static_cast<int>(topPoints.size())));
             ReadCaps(value, place, extruded->bottomCap, extruded->topCap);
             DorVector3 capAxis = ReadAppearance(value, place, *extruded, entity);
             extruded->MatchCapsToWalls();
@@ -434,7 +469,7 @@ private:
             CDorHolePolygon outline(bottom);
             for (const std::vector<DorVector3>& hole : holes)
                 outline.AddHole(CDorPolygon(hole.data(), static_cast<int>(hole.size())));
-            auto extruded = std::make_unique<CDorHoleExtruded>(outline, ReadDirection(*extrude, Member(place, "extrude")));
+            auto extruded = std::make_unique<CDorHoleExtruded>(outline, offset);
             ReadCaps(value, place, extruded->bottomCap, extruded->topCap);
             DorVector3 capAxis = ReadAppearance(value, place, *extruded, entity);
             extruded->MatchCapsToWalls();

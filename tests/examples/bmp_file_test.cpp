@@ -57,9 +57,9 @@ TEST(BmpDecode, PaddedRowsAreReadAtTheirStride)
 TEST(BmpDecode, ThirtyTwoBitsWithPlainBgraMasksAreAccepted)
 {
     std::vector<unsigned char> file = BmpFile(2, 2, 32);
-    std::vector<unsigned char> masked(file.begin(), file.begin() + 54);
-    masked.insert(masked.end(), {0, 0, 0xFF, 0, 0, 0xFF, 0, 0, 0xFF, 0, 0, 0});
-    masked.insert(masked.end(), file.begin() + 54, file.end());
+    const unsigned char masks[12] = {0, 0, 0xFF, 0, 0, 0xFF, 0, 0, 0xFF, 0, 0, 0};  // red, green, blue
+    std::vector<unsigned char> masked = file;
+    masked.insert(masked.begin() + 54, masks, masks + 12);
     PutU32(masked, 10, 66);
     PutU32(masked, 30, 3);
     _DorBitmap bitmap;

@@ -29,6 +29,7 @@ TEST(ViewerCommandLine, ASceneAloneOpensTheWindow)
 
 TEST(ViewerCommandLine, BatchOptionsInAnyOrder)
 {
+    EXPECT_TRUE(Parse({"s.json", "--size", "160x120"}).ok);
     Parsed p = Parse({"--size", "320x240", "--movie", "out/orbit.AVI", "--frames", "12", "--fps", "6", "scene.json",
                       "--snapshot", "a.png", "--pick", "319,0"});
     ASSERT_TRUE(p.ok) << p.error;
@@ -70,9 +71,11 @@ TEST(ViewerCommandLine, MistakesAreExplained)
         {{"a.json", "--movie", "a.avi", "--frames", "0"}, "--frames expects a whole number from 1 to 100000, found 0"},
         {{"a.json", "--movie", "a.avi", "--fps", "24.5"}, "--fps expects a whole number from 1 to 120, found 24.5"},
         {{"a.json", "--frames", "10"}, "--frames and --fps belong to --movie"},
-        {{"a.json", "--size", "100x100"}, "--size expects WxH with W and H from 160 to 4096, found 100x100"},
-        {{"a.json", "--size", "640x"}, "--size expects WxH with W and H from 160 to 4096, found 640x"},
-        {{"a.json", "--size", "99999999999x480"}, "--size expects WxH with W and H from 160 to 4096, found 99999999999x480"},
+        {{"a.json", "--size", "159x120"}, "--size expects WxH with W from 160 and H from 120 to 4096, found 159x120"},
+        {{"a.json", "--size", "160x119"}, "--size expects WxH with W from 160 and H from 120 to 4096, found 160x119"},
+        {{"a.json", "--size", "640x"}, "--size expects WxH with W from 160 and H from 120 to 4096, found 640x"},
+        {{"a.json", "--size", "99999999999x480"},
+         "--size expects WxH with W from 160 and H from 120 to 4096, found 99999999999x480"},
         {{"a.json", "--pick", "10;10"}, "--pick expects X,Y inside the 800x600 window, found 10;10"},
         {{"a.json", "--zoom"}, "unknown option --zoom"},
     };

@@ -125,6 +125,29 @@ TEST_F(SceneFileTest, ExplicitTopProfileMakesATaperedSolid)
     EXPECT_DOUBLE_EQ(frustum->top.points[2].z, 2.0);
 }
 
+// The converters leave a profile extruded straight along y as it comes; the loader turns it
+// so the walls face outward, keeping point 0 and the pairing of bottom and top points.
+TEST_F(SceneFileTest, ProfilesRunCounterClockwiseAboutTheExtrusion)
+{
+    ASSERT_TRUE(Parse(SceneWith(R"({"name": "along y", "type": "extrusion",
+            "profile": [[0, 0, 0], [1, 0, 0], [1, 0, 1], [0, 0, 1]], "extrude": [0, 2, 0]},
+        {"name": "tapered", "type": "extrusion", "profile": [[0, 0, 0], [4, 0, 0], [4, 0, 4], [0, 0, 4]],
+            "top": [[1, 3, 1], [3, 3, 1], [3, 3, 3], [1, 3, 3]]})")))
+        << error;
+    for (int e = 0; e < 2; ++e) {
+        const CDorExtruded& solid = dynamic_cast<const CDorExtruded&>(*scene.entities[e]->geometry);
+        DorVector3 direction = solid.top.points[0] - solid.bottom.points[0];
+        EXPECT_GT(DorDot(DorNewellNormal(solid.bottom.points.GetData(), 4), direction), 0.0) << e;
+        EXPECT_GT(DorDot(DorNewellNormal(solid.top.points.GetData(), 4), direction), 0.0) << e;
+        EXPECT_DOUBLE_EQ(solid.bottom.points[0].x, 0.0) << e;
+        EXPECT_DOUBLE_EQ(solid.bottom.points[0].z, 0.0) << e;
+    }
+    const CDorExtruded& tapered = dynamic_cast<const CDorExtruded&>(*scene.entities[1]->geometry);
+    EXPECT_DOUBLE_EQ(tapered.bottom.points[1].z, 4.0);  // (0, 0, 4) now follows point 0 ...
+    EXPECT_DOUBLE_EQ(tapered.top.points[1].x, 1.0);     // ... and its top partner (1, 3, 3) still pairs with it
+    EXPECT_DOUBLE_EQ(tapered.top.points[1].z, 3.0);
+}
+
 // A wall standing in the x-z plane with a door given clockwise and a window given
 // counter-clockwise (seen from -y): both end up running the outline's way round.
 class WallWithOpenings : public SceneFileTest {
