@@ -217,6 +217,44 @@ TEST_F(LiveModeller, TriangleFacingASlopedCameraAppearsWhereTheViewMatrixPutsIt)
     EXPECT_TRUE(IsBackground(pixel(centre - up * 2)));
 }
 
+TEST_F(LiveModeller, OffsetMovesCameraAndSceneTogether)
+{
+    // The camera is kept in model coordinates, so the offset never shifts the picture.
+    Add(Rectangle(2, 1, 5, 4, 0, Matte(1, 0, 0)));
+    DorVector3 offset(100, -40, 7);
+    karvel.SetOffset(offset);
+    EXPECT_EQ(karvel.model.offset.x, 100.0);
+    EXPECT_GT(Draw(3.5, 0, 2.5).r, 150);
+    EXPECT_TRUE(IsBackground(Draw(1.7, 0, 2.5)));
+    EXPECT_TRUE(IsBackground(Draw(-3.5, 0, -2.5)));
+}
+
+TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
+{
+    karvel.Finalize();
+    HDC dc = window.dc;
+    _VelViewport quarter = {0, 0, kWidth / 2, kHeight / 2};
+    ASSERT_EQ(karvel.Initialize(dc, quarter), 1);
+    GLint gl[4];
+    glGetIntegerv(GL_VIEWPORT, gl);
+    EXPECT_EQ(gl[2], kWidth / 2);
+    EXPECT_EQ(gl[3], kHeight / 2);
+    _VelViewport now;
+    karvel.GetViewport(now);
+    EXPECT_EQ(now.width, kWidth / 2);
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
+    camera.eye = DorVector3(0, -10, 0);
+    camera.target = DorVector3(0, 0, 0);
+    camera.fovy = 90;
+    karvel.SetCamera(camera);
+    Add(Rectangle(-1, -1, 1, 1, 0, Matte(0, 1, 0)));
+    karvel.DrawModel(dc);
+    EXPECT_GT(PixelAt(kWidth / 4, kHeight * 3 / 4).g, 150);  // centre of the lower-left quarter
+    EXPECT_TRUE(IsBackground(PixelAt(kWidth / 2, kHeight / 2)));
+}
+
 TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
 {
     _DorPosition* rect = Add(Rectangle(-2, -2, 2, 2, 0, Matte(0, 1, 0)));
@@ -419,6 +457,47 @@ TEST(ModellerLifecycle, UninitialisedModellerKeepsItsStoreAndRefusesSceneCalls)
     _DorPosition* none = nullptr;
     EXPECT_EQ(karvel.GetFreeProperty(none), nullptr);
     EXPECT_EQ(karvel.GetDrawMode(none), -1);
+}
+
+TEST(ModellerStore, TheTwoMoveShapesTreatNormalsDifferently)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    _DorPosition* own = karvel.AddPrimitive(p);
+    _DorPosition* base = karvel.AddPrimitive(p);
+    DorMatrix4x4 shift = DorTranslate(10, 0, 0);
+    karvel.MoveShape(own, shift);
+    static_cast<CVelKarvel&>(karvel).MoveShape(base, shift);
+    CVelPrimitive a, b;
+    karvel.GetPrimitive(own, a, 1);
+    karvel.GetPrimitive(base, b, 1);
+    EXPECT_EQ(a.groups[0].vertices[1].position.x, 11.0);
+    EXPECT_EQ(b.groups[0].vertices[1].position.x, 11.0);
+    // The modeller's own turns the normal only; the interface's translates it too.
+    EXPECT_FLOAT_EQ(a.groups[0].vertices[1].normal.y, -1);
+    EXPECT_NEAR(b.groups[0].vertices[1].normal.x, 10 / std::sqrt(101.0), 1e-6);
+}
+
+TEST(ModellerStore, CopyTakesTheModelAndStartsUninitialised)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    karvel.AddPrimitive(p);
+    DorColorValue blue(0, 0, 1, 1);
+    karvel.SetBkColor(blue);
+    TestWindow window(kWidth, kHeight);
+    HDC dc = window.dc;
+    ASSERT_EQ(karvel.Initialize(dc), 1);
+    karvel.AddPrimitive(p);
+    CVelGLKarvel copy(karvel);
+    EXPECT_EQ(copy.renderState, nullptr);
+    EXPECT_EQ(copy.context.handle, nullptr);
+    EXPECT_EQ(copy.model.entities.GetCount(), 1);
+    DorColorValue colour;
+    copy.GetBkColor(colour);
+    EXPECT_EQ(colour.b, 1.0f);
+    copy = copy;
+    EXPECT_EQ(copy.model.entities.GetCount(), 1);
 }
 
 TEST(ModellerLifecycle, FirstInitializeStartsFromAnEmptyModelAndKeepsTextures)
