@@ -87,10 +87,22 @@ _DorBitmap HalfWhite(int width)
         b.bits[i] = 255;
     return b;
 }
+// Puts the camera 10 units in front of the origin on -y, looking along +y with a 90 degree
+// field of view: x to the right, z up.
+void LookAlongY(CVelGLKarvel& karvel)
+{
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    camera.eye = DorVector3(0, -10, 0);
+    camera.target = DorVector3(0, 0, 0);
+    camera.fovy = 90;
+    camera.zNear = 1;
+    camera.zFar = 1000;
+    karvel.SetCamera(camera);
+}
 }  // namespace
 
-// A modeller live in a 160 x 120 window, its camera 10 units in front of the origin on -y,
-// looking along +y with a 90 degree field of view: x to the right, z up.
+// A modeller live in a 160 x 120 window, its camera along +y (LookAlongY).
 class LiveModeller : public ::testing::Test {
 protected:
     // One window for the suite: creating one under Wine takes about two seconds.
@@ -105,14 +117,7 @@ protected:
     {
         ASSERT_EQ(karvel.Initialize(window.dc), 1);
         ASSERT_NE(karvel.GetCurrent(), nullptr);
-        _VelCamera camera;
-        karvel.GetCamera(camera);
-        camera.eye = DorVector3(0, -10, 0);
-        camera.target = DorVector3(0, 0, 0);
-        camera.fovy = 90;
-        camera.zNear = 1;
-        camera.zFar = 1000;
-        karvel.SetCamera(camera);
+        LookAlongY(karvel);
     }
 
     void TearDown() override { karvel.Finalize(); }
@@ -245,10 +250,7 @@ TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
     _VelCamera camera;
     karvel.GetCamera(camera);
     EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
-    camera.eye = DorVector3(0, -10, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 90;
-    karvel.SetCamera(camera);
+    LookAlongY(karvel);
     Add(Rectangle(-1, -1, 1, 1, 0, Matte(0, 1, 0)));
     karvel.DrawModel(dc);
     EXPECT_GT(PixelAt(kWidth / 4, kHeight * 3 / 4).g, 150);  // centre of the lower-left quarter
@@ -372,12 +374,7 @@ TEST_F(LiveModeller, TexturedRectangleShowsItsTexture)
     ASSERT_EQ(karvel.AddTexture(texture), 1u);
     HDC dc = window.dc;
     ASSERT_EQ(karvel.Initialize(dc), 1);
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    camera.eye = DorVector3(0, -10, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 90;
-    karvel.SetCamera(camera);
+    LookAlongY(karvel);
     DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
     karvel.SetBkColor(grey);
 
@@ -528,10 +525,7 @@ TEST(ModellerLifecycle, MovesToASecondWindowWithModelTexturesAndCamera)
     _VelCamera camera;
     karvel.GetCamera(camera);
     EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 120.0);
-    camera.eye = DorVector3(0, -10, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 90;
-    karvel.SetCamera(camera);
+    LookAlongY(karvel);
     CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
     p.groups[0].RenderKind = VelRenderTextured;
     p.groups[0].texture = 1;
