@@ -53,6 +53,12 @@ DorDirectionKind DorDirectionAngles(const DorVector3& d, double& elevation, doub
     return DorDirectionSloped;
 }
 
+double DorAzimuth(const DorVector3& d)
+{
+    double elevation = 0.0, azimuth = 0.0;
+    return DorDirectionAngles(d, elevation, azimuth) == DorDirectionTooShort ? 0.0 : azimuth;
+}
+
 DorMatrix4x4 DorRotateX(double a)
 {
     DorMatrix4x4 m;

@@ -28,6 +28,8 @@ enum DorDirectionKind { DorDirectionTooShort = 0, DorDirectionSloped = 1, DorDir
 // Elevation asin(z/|d|) and azimuth of d in radians. The azimuth is atan(y/x), plus pi for x < 0,
 // +-pi/2 for x = 0; a vertical direction (x = y = 0) gets azimuth 0.
 KARVEL_API DorDirectionKind DorDirectionAngles(const DorVector3& d, double& elevation, double& azimuth);
+// The azimuth of DorDirectionAngles, or 0 when d is too short to give one.
+KARVEL_API double DorAzimuth(const DorVector3& d);
 
 KARVEL_API DorMatrix4x4 DorRotateX(double radians);
 KARVEL_API DorMatrix4x4 DorRotateY(double radians);

@@ -1,27 +1,12 @@
 // The records' field order and widths are the library's binary interface: hosts built against
 // one release must be able to load another. Any change here is a breaking change.
-#include <cstddef>
-
 #include "camera/vel_camera.h"
 #include "gl/vel_karvel.h"
+#include "model/dor_layout_check.h"
 #include "model/dor_list.h"
 #include "model/dor_types.h"
 #include "model/vel_primitive.h"
 
-#if defined(__GNUC__)
-// NOTE: offsetof on a class with a virtual table is conditionally supported; GCC, Clang and MSVC
-// all give the real offset.
-#  pragma GCC diagnostic ignored "-Winvalid-offsetof"
-#endif
-
-#define KARVEL_FIELD(T, f, off) static_assert(offsetof(T, f) == (off), #T "::" #f " moved")
-#define KARVEL_SIZE(T, n) static_assert(sizeof(T) == (n), "size of " #T " changed")
-
-#if defined(_WIN32) && !defined(_WIN64)
-#  define KARVEL_PICK(bits32, bits64) (bits32)
-#else
-#  define KARVEL_PICK(bits32, bits64) (bits64)
-#endif
 static_assert(sizeof(void*) == KARVEL_PICK(4, 8), "layout table does not match this target");
 
 KARVEL_FIELD(DorVector2, dimension, 0);

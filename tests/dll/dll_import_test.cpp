@@ -2,6 +2,7 @@
 // the DLL boundary (allocation on one side, release on the other).
 #include <gtest/gtest.h>
 
+#include "convert/dor_shape.h"
 #include "primitives/vel_math_primitive.h"
 #include "tests/support/recording_karvel.h"
 
@@ -28,4 +29,18 @@ TEST(KarvelDll, CameraWrappersCallBackIntoAHostModeller)
     EXPECT_EQ(host.setCameraCalls, 1);
     EXPECT_EQ(host.camera.eye.y, 10.0);
     EXPECT_EQ(modeller.GetCullMode(), 1);
+}
+
+TEST(KarvelDll, ShapeBuiltByTheHostIsConvertedInsideTheDll)
+{
+    CDorExtruded box(CDorPolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(1, 1, 0), DorVector3(0, 1, 0)}),
+                     DorVector3(0, 0, 1));
+    CDorShape shape;
+    shape.Add(&box);
+    RecordingKarvel host;
+    _DorPosition* entity = host.AddShape(shape);
+    ASSERT_EQ(host.entities.count(entity), 1u);
+    const CVelPrimitive& primitive = host.entities[entity];
+    ASSERT_EQ(primitive.groups.GetSize(), 6);  // the kind check recognises the host's object
+    EXPECT_EQ(primitive.groups[5].vertices[0].normal.z, 1.0);
 }

@@ -1,0 +1,47 @@
+#pragma once
+// Plane geometry shared by both triangulations. They work on outlines already projected into
+// their own plane (x, y of the plane projection), where counter-clockwise is positive.
+#include "model/dor_types.h"
+
+inline double VelCross2(const DorVector2& a, const DorVector2& b) { return a.x * b.y - a.y * b.x; }
+inline double VelDot2(const DorVector2& a, const DorVector2& b) { return a.x * b.x + a.y * b.y; }
+inline DorVector2 VelSub2(const DorVector2& a, const DorVector2& b) { return DorVector2(a.x - b.x, a.y - b.y); }
+inline DorVector2 VelMidpoint2(const DorVector2& a, const DorVector2& b)
+{
+    return DorVector2((a.x + b.x) * 0.5, (a.y + b.y) * 0.5);
+}
+
+// Divides v by its length when that is at least 0.0001.
+void VelNormalize2(DorVector2& v);
+
+// Whether segment p0-p1 crosses segment a0-a1 at a point strictly inside both. Parallel segments
+// (cross product exactly 0) never cross.
+// Inline: the triangulations call it for every candidate against every listed edge.
+inline bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1)
+{
+    DorVector2 d = VelSub2(p1, p0), e = VelSub2(a1, a0);
+    double det = VelCross2(e, d);
+    if (det == 0.0)
+        return false;
+    // p0 + s d = a0 + t e
+    DorVector2 w = VelSub2(a0, p0);
+    double s = VelCross2(e, w) / det;
+    double t = VelCross2(d, w) / det;
+    return s > 0.0 && s < 1.0 && t > 0.0 && t < 1.0;
+}
+
+// The signed angle that the closed loop[0..count-1] subtends at q, summed edge by edge with
+// atan2(cross, dot). An edge with an end exactly on q (cross and dot both 0) adds nothing.
+// About +-2 pi inside, about 0 outside.
+double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count);
+
+// The same sum over the loop loop[indices[0..count-1]], for loops that live in a shared list.
+double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int* indices, int count);
+
+// Whether a winding sum puts its point inside: |sum| > pi.
+bool VelWindingInside(double angleSum);
+
+// Whether p lies on segment a-b strictly between its ends: its parameter t along a-b satisfies
+// 0 < t < 1 and is at least 1e-6 from both ends, and its distance from the segment is below
+// 1e-6. A zero-length segment holds no point.
+bool VelPointOnSegment(const DorVector2& p, const DorVector2& a, const DorVector2& b);

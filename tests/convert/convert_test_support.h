@@ -1,0 +1,66 @@
+#pragma once
+// Geometry checks shared by the converter tests.
+#include <cmath>
+#include <vector>
+
+#include "convert/dor_shape.h"
+#include "model/dor_math.h"
+
+namespace convert_test {
+
+const double kPi = 3.14159265358979323846;
+
+inline std::vector<DorVector3> RegularPolygon(int n, double radius = 1.0)
+{
+    std::vector<DorVector3> points;
+    for (int k = 0; k < n; ++k)
+        points.push_back(DorVector3(radius * std::cos(2 * kPi * k / n), radius * std::sin(2 * kPi * k / n), 0));
+    return points;
+}
+
+// Alternating outer and inner radii, counter-clockwise.
+inline std::vector<DorVector3> Star(int tips, double outer, double inner)
+{
+    std::vector<DorVector3> points;
+    for (int k = 0; k < 2 * tips; ++k) {
+        double r = k % 2 ? inner : outer, a = kPi * k / tips;
+        points.push_back(DorVector3(r * std::cos(a), r * std::sin(a), 0));
+    }
+    return points;
+}
+
+// An L of six corners: a 2 x 2 square without its upper right unit square.
+inline std::vector<DorVector3> LShape()
+{
+    return {DorVector3(0, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 1, 0),
+            DorVector3(1, 1, 0), DorVector3(1, 2, 0), DorVector3(0, 2, 0)};
+}
+
+inline CDorPolygon Polygon(const std::vector<DorVector3>& points)
+{
+    return CDorPolygon(points.data(), static_cast<int>(points.size()));
+}
+
+// The area enclosed by a planar loop: half the length of its Newell normal.
+inline double LoopArea(const std::vector<DorVector3>& points)
+{
+    return DorLength(DorNewellNormal(points.data(), static_cast<int>(points.size()))) * 0.5;
+}
+
+// Twice the signed area of triangle abc seen from the side into which `normal` points.
+inline double SignedDoubleArea(const DorVector3& a, const DorVector3& b, const DorVector3& c, const DorVector3& normal)
+{
+    return DorDot(DorCross(b - a, c - a), normal);
+}
+
+inline DorMatrix4x4 RotationXYZ(double x, double y, double z) { return DorRotateX(x) * DorRotateY(y) * DorRotateZ(z); }
+
+inline std::vector<DorVector3> Transformed(const std::vector<DorVector3>& points, const DorMatrix4x4& m)
+{
+    std::vector<DorVector3> out;
+    for (const DorVector3& p : points)
+        out.push_back(DorTransformPoint(p, m));
+    return out;
+}
+
+}  // namespace convert_test
