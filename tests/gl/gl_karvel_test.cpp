@@ -257,6 +257,34 @@ TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
     EXPECT_TRUE(IsBackground(PixelAt(kWidth / 2, kHeight / 2)));
 }
 
+TEST_F(LiveModeller, EachLineGroupSetsItsOwnWidth)
+{
+    // Vertical segments through the centres of pixel columns 80 and 100 (6 pixels per unit).
+    CVelPrimitive p;
+    const double columns[] = {80.5, 100.5};
+    const float widths[] = {3, 1};
+    for (int i = 0; i < 2; ++i) {
+        CVelTrianglePolys g;
+        g.GroupType = VelGroupLines;
+        g.lineWidth = widths[i];
+        g.material = Matte(1, 1, 1);
+        double x = (columns[i] - kWidth / 2.0) / 6;
+        AddVertex(g, x, 0, -3);
+        AddVertex(g, x, 0, 3);
+        p.groups.Add(g);
+    }
+    Add(p);
+    karvel.DrawModel(window.dc);
+    const int row = kHeight / 2 + 5;
+    EXPECT_TRUE(IsBackground(PixelAt(78, row)));
+    for (int col = 79; col <= 81; ++col)
+        EXPECT_GT(PixelAt(col, row).r, 150) << col;
+    EXPECT_TRUE(IsBackground(PixelAt(82, row)));
+    EXPECT_TRUE(IsBackground(PixelAt(99, row)));
+    EXPECT_GT(PixelAt(100, row).r, 150);
+    EXPECT_TRUE(IsBackground(PixelAt(101, row)));
+}
+
 TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
 {
     _DorPosition* rect = Add(Rectangle(-2, -2, 2, 2, 0, Matte(0, 1, 0)));
