@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "camera/vel_math_camera.h"
+#include "convert/dor_shape.h"
 #include "gl/vel_gl_karvel.h"
 #include "model/dor_math.h"
 #include "support/win32_test_window.h"
@@ -283,6 +284,22 @@ TEST_F(LiveModeller, EachLineGroupSetsItsOwnWidth)
     EXPECT_TRUE(IsBackground(PixelAt(99, row)));
     EXPECT_GT(PixelAt(100, row).r, 150);
     EXPECT_TRUE(IsBackground(PixelAt(101, row)));
+}
+
+TEST_F(LiveModeller, ExtrudedBoxAddedAsAShapeIsDrawnSolid)
+{
+    const DorVector3 square[] = {DorVector3(-2, -2, -2), DorVector3(2, -2, -2), DorVector3(2, 2, -2),
+                                 DorVector3(-2, 2, -2)};
+    CDorExtruded box(CDorPolygon(square, 4), DorVector3(0, 0, 4));
+    box.SetMaterial(Matte(1, 0, 0));
+    box.MatchCapsToWalls();
+    CDorShape shape;
+    shape.Add(&box);
+    ASSERT_NE(karvel.AddShape(shape), nullptr);
+    EXPECT_GT(Draw(0, -2, 0).r, 150);  // the front wall faces the camera
+    EXPECT_GT(Draw(1.8, -2, 1.8).r, 150);
+    EXPECT_TRUE(IsBackground(Draw(2.5, -2, 0)));
+    EXPECT_TRUE(IsBackground(Draw(0, -2, 2.5)));
 }
 
 TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
