@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "convert/dor_shape.h"
+#include "movie/vfw_math_movie.h"
 #include "primitives/vel_math_primitive.h"
 #include "tests/support/recording_karvel.h"
 
@@ -43,4 +44,16 @@ TEST(KarvelDll, ShapeBuiltByTheHostIsConvertedInsideTheDll)
     const CVelPrimitive& primitive = host.entities[entity];
     ASSERT_EQ(primitive.groups.GetSize(), 6);  // the kind check recognises the host's object
     EXPECT_EQ(primitive.groups[5].vertices[0].normal.z, 1.0);
+}
+
+TEST(KarvelDll, RecordersAreExported)
+{
+    _DorBitmap frame;
+    frame.info.width = frame.info.height = 4;
+    frame.bits.SetSize(48);
+    CVelMathMovie_NoComp plain;
+    CVelMathMovie compressed;
+    EXPECT_EQ(plain.Start(frame, "Z:\\no\\such\\folder\\movie.avi", 10, "m", 1), 0);
+    EXPECT_EQ(compressed.Start(frame, "Z:\\no\\such\\folder\\movie.avi", 10, "m", 1), 0);
+    EXPECT_EQ(plain.IsStart() + compressed.IsStart(), 0);
 }
