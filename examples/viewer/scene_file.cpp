@@ -85,6 +85,15 @@ double ReadNumber(const Json& value, const std::string& place, const std::string
     return value.get<double>();
 }
 
+// A number from low to high, both included.
+double ReadBounded(const Json& value, const std::string& place, double low, double high, const std::string& what)
+{
+    double number = ReadNumber(value, place, what);
+    if (number < low || number > high)
+        FailFound(place, what, value);
+    return number;
+}
+
 double ReadPositive(const Json& value, const std::string& place)
 {
     double number = ReadNumber(value, place, "a number above 0");
@@ -170,12 +179,16 @@ DorColorValue ReadColour(const Json& value, const std::string& place)
     const Json& rgba = ReadArray(value, place, 3, 4, what);
     float c[4] = {1.0f, 1.0f, 1.0f, 1.0f};
     for (size_t i = 0; i < rgba.size(); ++i) {
-        double v = ReadNumber(rgba[i], Item(place, i), "a number from 0 to 1");
-        if (v < 0.0 || v > 1.0)
-            FailFound(Item(place, i), "a number from 0 to 1", rgba[i]);
-        c[i] = static_cast<float>(v);
+        c[i] = static_cast<float>(ReadBounded(rgba[i], Item(place, i), 0.0, 1.0, "a number from 0 to 1"));
     }
     return DorColorValue(c[0], c[1], c[2], c[3]);
+}
+
+// Replaces colour with the one under key, when the object has one.
+void ReadOptionalColour(const Json& object, const char* key, const std::string& place, DorColorValue& colour)
+{
+    if (const Json* value = Find(object, key))
+        colour = ReadColour(*value, Member(place, key));
 }
 
 DorColorValue Scaled(const DorColorValue& c, float s) { return DorColorValue(c.r * s, c.g * s, c.b * s, c.a); }
@@ -194,18 +207,11 @@ _DorMaterial ReadMaterial(const Json& value, const std::string& place, _DorMater
         base.emission = DorColorValue(0.0f, 0.0f, 0.0f, 0.0f);
         base.shininess = 30.0f;
     }
-    if (const Json* c = Find(value, "diffuse"))
-        base.diffuse = ReadColour(*c, Member(place, "diffuse"));
-    if (const Json* c = Find(value, "ambient"))
-        base.ambient = ReadColour(*c, Member(place, "ambient"));
-    if (const Json* c = Find(value, "specular"))
-        base.specular = ReadColour(*c, Member(place, "specular"));
-    if (const Json* s = Find(value, "shininess")) {
-        double shininess = ReadNumber(*s, Member(place, "shininess"), "a number from 0 to 128");
-        if (shininess < 0.0 || shininess > 128.0)
-            FailFound(Member(place, "shininess"), "a number from 0 to 128", *s);
-        base.shininess = static_cast<float>(shininess);
-    }
+    ReadOptionalColour(value, "diffuse", place, base.diffuse);
+    ReadOptionalColour(value, "ambient", place, base.ambient);
+    ReadOptionalColour(value, "specular", place, base.specular);
+    if (const Json* s = Find(value, "shininess"))
+        base.shininess = static_cast<float>(ReadBounded(*s, Member(place, "shininess"), 0.0, 128.0, "a number from 0 to 128"));
     return base;
 }
 
@@ -379,18 +385,12 @@ private:
         light.specular = DorColorValue(1.0f, 1.0f, 1.0f, 1.0f);
         light.attenuation = 0.00001f;
         light.enabled = 1;
-        if (const Json* c = Find(value, "diffuse"))
-            light.diffuse = ReadColour(*c, Member(place, "diffuse"));
-        if (const Json* c = Find(value, "ambient"))
-            light.ambient = ReadColour(*c, Member(place, "ambient"));
-        if (const Json* c = Find(value, "specular"))
-            light.specular = ReadColour(*c, Member(place, "specular"));
-        if (const Json* a = Find(value, "attenuation")) {
-            double attenuation = ReadNumber(*a, Member(place, "attenuation"), "a number of 0 or more");
-            if (attenuation < 0.0)
-                FailFound(Member(place, "attenuation"), "a number of 0 or more", *a);
-            light.attenuation = static_cast<float>(attenuation);
-        }
+        ReadOptionalColour(value, "diffuse", place, light.diffuse);
+        ReadOptionalColour(value, "ambient", place, light.ambient);
+        ReadOptionalColour(value, "specular", place, light.specular);
+        if (const Json* a = Find(value, "attenuation"))
+            light.attenuation = static_cast<float>(
+                ReadBounded(*a, Member(place, "attenuation"), 0.0, 1e30, "a number of 0 or more"));
         if (const Json* e = Find(value, "enabled"))
             light.enabled = ReadBool(*e, Member(place, "enabled")) ? 1 : 0;
         scene_.lights.push_back(entry);
@@ -457,26 +457,29 @@ private:
 
         CDorPolygon bottom(profile.data(), static_cast<int>(profile.size()));
         if (holes.empty()) {
-            auto extruded = std::make_unique<CDorExtruded>(
-                bottom, CDorPolygon(topPoints.data(), static_cast<int>(topPoints.size())));
-            ReadCaps(value, place, extruded->bottomCap, extruded->topCap);
-            DorVector3 capAxis = ReadAppearance(value, place, *extruded, entity);
-            extruded->MatchCapsToWalls();
-            extruded->bottom.textureAxis = capAxis;
-            extruded->top.textureAxis = MovedWithProfile(capAxis, extruded->bottom.points, extruded->top.points);
-            entity.geometry = std::move(extruded);
+            CDorPolygon topProfile(topPoints.data(), static_cast<int>(topPoints.size()));
+            Dress(value, place, std::make_unique<CDorExtruded>(bottom, topProfile), &CDorPolygon::textureAxis, entity);
         } else {
             CDorHolePolygon outline(bottom);
             for (const std::vector<DorVector3>& hole : holes)
                 outline.AddHole(CDorPolygon(hole.data(), static_cast<int>(hole.size())));
-            auto extruded = std::make_unique<CDorHoleExtruded>(outline, offset);
-            ReadCaps(value, place, extruded->bottomCap, extruded->topCap);
-            DorVector3 capAxis = ReadAppearance(value, place, *extruded, entity);
-            extruded->MatchCapsToWalls();
-            extruded->bottom.holeTextureAxis = capAxis;
-            extruded->top.holeTextureAxis = MovedWithProfile(capAxis, extruded->bottom.points, extruded->top.points);
-            entity.geometry = std::move(extruded);
+            Dress(value, place, std::make_unique<CDorHoleExtruded>(outline, offset), &CDorHolePolygon::holeTextureAxis,
+                  entity);
         }
+    }
+
+    // Caps and look of either kind of extrusion; capAxisField is the profiles' texture axis.
+    template <class Extrusion, class Profile>
+    void Dress(const Json& value, const std::string& place, std::unique_ptr<Extrusion> extruded,
+               DorVector3 Profile::*capAxisField, SceneEntity& entity)
+    {
+        ReadCaps(value, place, extruded->bottomCap, extruded->topCap);
+        DorVector3 capAxis;
+        ReadAppearance(value, place, *extruded, entity, extruded->textureAxis, capAxis);
+        extruded->MatchCapsToWalls();
+        extruded->bottom.*capAxisField = capAxis;
+        extruded->top.*capAxisField = MovedWithProfile(capAxis, extruded->bottom.points, extruded->top.points);
+        entity.geometry = std::move(extruded);
     }
 
     void ReadCaps(const Json& value, const std::string& place, int& bottomCap, int& topCap)
@@ -493,9 +496,10 @@ private:
             topCap = ReadBool(*t, Member(capsPlace, "top")) ? 1 : 0;
     }
 
-    // Style, material and texture of the walls; the caller hands them on to the caps. Returns the
-    // caps' texture axis point (zero when not given).
-    DorVector3 ReadAppearance(const Json& value, const std::string& place, CDorGeometry& geometry, SceneEntity& entity)
+    // Style, material and texture of the walls; the caller hands them on to the caps. The texture
+    // axes stay zero when not given.
+    void ReadAppearance(const Json& value, const std::string& place, CDorGeometry& geometry, SceneEntity& entity,
+                        DorVector3& wallAxis, DorVector3& capAxis)
     {
         if (const Json* style = Find(value, "style"))
             geometry.style = ReadChoice(*style, Member(place, "style"), {"solid", "wire"}) == 0 ? DorStyleSolid : DorStyleWire;
@@ -503,7 +507,7 @@ private:
             geometry.material = ReadMaterial(*material, Member(place, "material"), geometry.material);
         const Json* texture = Find(value, "texture");
         if (!texture)
-            return DorVector3();
+            return;
         std::string texturePlace = Member(place, "texture");
         ExpectObject(*texture, texturePlace, "a texture object");
         CheckKeys(*texture, texturePlace, {"file", "scale", "axis", "capAxis"});
@@ -515,15 +519,10 @@ private:
             geometry.textureScaleU = ReadPositive(uv[0], Item(scalePlace, 0));
             geometry.textureScaleV = ReadPositive(uv[1], Item(scalePlace, 1));
         }
-        DorVector3 axis;
         if (const Json* a = Find(*texture, "axis"))
-            axis = ReadDirection(*a, Member(texturePlace, "axis"));
-        if (auto* extruded = dynamic_cast<CDorExtruded*>(&geometry))
-            extruded->textureAxis = axis;
-        else if (auto* holed = dynamic_cast<CDorHoleExtruded*>(&geometry))
-            holed->textureAxis = axis;
-        const Json* capAxis = Find(*texture, "capAxis");
-        return capAxis ? ReadPoint(*capAxis, Member(texturePlace, "capAxis")) : DorVector3();
+            wallAxis = ReadDirection(*a, Member(texturePlace, "axis"));
+        if (const Json* a = Find(*texture, "capAxis"))
+            capAxis = ReadPoint(*a, Member(texturePlace, "capAxis"));
     }
 
     // Each distinct file is read once; every entity that names it shares it.
@@ -555,12 +554,9 @@ private:
     {
         if (const Json* material = Find(value, "material"))
             group.material = ReadMaterial(*material, Member(place, "material"), group.material);
-        if (const Json* width = Find(value, "width")) {
-            double pixels = ReadNumber(*width, Member(place, "width"), "a line width in pixels from 1 to 10");
-            if (pixels < 1.0 || pixels > 10.0)
-                FailFound(Member(place, "width"), "a line width in pixels from 1 to 10", *width);
-            group.lineWidth = static_cast<float>(pixels);
-        }
+        if (const Json* width = Find(value, "width"))
+            group.lineWidth = static_cast<float>(
+                ReadBounded(*width, Member(place, "width"), 1.0, 10.0, "a line width in pixels from 1 to 10"));
     }
 
     void ReadLine(const Json& value, const std::string& place, SceneEntity& entity)
