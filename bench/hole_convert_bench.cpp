@@ -7,7 +7,7 @@
 #include "convert/convert_test_support.h"
 #include "convert/hole_shapes.h"
 #include "convert/vel_hole_polygon_to_primitive.h"
-#include "convert/vel_shape_to_primitive.h"
+#include "convert_bench_support.h"
 
 using namespace hole_test;
 
@@ -50,14 +50,7 @@ void ConvertHoledScene(benchmark::State& state)
         solids.push_back(std::make_unique<CDorHoleExtruded>(face, DorVector3(0, 0, 1 + i % 3)));
         shape.Add(solids.back().get());
     }
-    int groups = 0;
-    for (auto _ : state) {
-        CVelPrimitive primitive;
-        CVelShapeToPrimitive().ConvertShape(shape, primitive);
-        groups = primitive.groups.GetSize();
-        benchmark::DoNotOptimize(primitive.groups.data);
-    }
-    state.counters["groups"] = groups;
+    ConvertShapeRepeatedly(state, shape);
 }
 }  // namespace
 

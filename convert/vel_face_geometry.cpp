@@ -26,6 +26,22 @@ DorVector3 VelFaceNormal(const CDorArray<DorVector3, DorVector3&>& loop, int rev
     return normal;
 }
 
+void VelFillIndexedFace(const CDorArray<DorVector3, DorVector3&>& points, const CDorArray<int, int>& indices,
+                        const DorVector3& normal, int reverse, CVelTrianglePolys& group)
+{
+    group.GroupType = VelGroupIndexed;
+    group.vertices.SetSize(points.GetSize());
+    for (int k = 0; k < points.GetSize(); ++k) {
+        group.vertices[k].position = points[k];
+        group.vertices[k].normal = normal;
+    }
+    group.triangles.SetSize(indices.GetSize() / 3);
+    for (int t = 0; t < group.triangles.GetSize(); ++t) {
+        int a = indices[3 * t], b = indices[3 * t + 1], c = indices[3 * t + 2];
+        group.triangles[t] = reverse == 1 ? _VelTriangleIndex(c, b, a) : _VelTriangleIndex(a, b, c);
+    }
+}
+
 void VelSetPlanarTexCoords(CVelTrianglePolys& group, const DorVector3& axis, const DorVector3& origin, double scaleU,
                            double scaleV)
 {

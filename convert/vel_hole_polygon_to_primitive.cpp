@@ -45,17 +45,7 @@ void CVelHolePolygonToPrimitive::ConvertSolidHolePolygon(CDorHolePolygon* shape,
     }
 
     CVelTrianglePolys group;
-    group.GroupType = VelGroupIndexed;
-    group.vertices.SetSize(vertices.GetSize());
-    for (int k = 0; k < vertices.GetSize(); ++k) {
-        group.vertices[k].position = vertices[k];
-        group.vertices[k].normal = normal;
-    }
-    group.triangles.SetSize(indices.GetSize() / 3);
-    for (int t = 0; t < group.triangles.GetSize(); ++t) {
-        int a = indices[3 * t], b = indices[3 * t + 1], c = indices[3 * t + 2];
-        group.triangles[t] = flip == 1 ? _VelTriangleIndex(c, b, a) : _VelTriangleIndex(a, b, c);
-    }
+    VelFillIndexedFace(vertices, indices, normal, flip, group);
     group.material = shape->material;
     if (shape->texture != 0) {
         group.RenderKind = VelRenderTextured;

@@ -23,17 +23,7 @@ void CVelPolygonToPrimitive::ConvertSolidPolygon(CDorPolygon* polygon, CVelGroup
         return;
 
     CVelTrianglePolys group;
-    group.GroupType = VelGroupIndexed;
-    group.vertices.SetSize(n);
-    for (int i = 0; i < n; ++i) {
-        group.vertices[i].position = polygon->points[i];
-        group.vertices[i].normal = normal;
-    }
-    group.triangles.SetSize(indices.GetSize() / 3);
-    for (int t = 0; t < group.triangles.GetSize(); ++t) {
-        int a = indices[3 * t], b = indices[3 * t + 1], c = indices[3 * t + 2];
-        group.triangles[t] = reverse == 1 ? _VelTriangleIndex(c, b, a) : _VelTriangleIndex(a, b, c);
-    }
+    VelFillIndexedFace(polygon->points, indices, normal, reverse, group);
     group.material = polygon->material;
     if (polygon->texture != 0)
         group.RenderKind = VelRenderTextured;
