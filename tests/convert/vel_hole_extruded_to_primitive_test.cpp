@@ -240,10 +240,12 @@ TEST_F(BlockWithSquareHole, UnpairedHolesAreSkippedSafely)
     }
 }
 
-TEST_F(BlockWithSquareHole, NonFiniteCoordinatesStaySafe)
+TEST_F(BlockWithSquareHole, NonFiniteCoordinatesAndZeroScalesStaySafe)
 {
     block.bottom.holes[0].points[2].x = std::numeric_limits<double>::quiet_NaN();
     block.top.points[1].y = std::numeric_limits<double>::infinity();
+    block.SetTexture(2, 0.0, 0.0);
+    block.bottom.SetTexture(2, 0.0, 0.0);
     for (int style : {DorStyleSolid, DorStyleWire}) {
         block.style = style;
         CVelGroupArray groups = Convert();
