@@ -4,6 +4,7 @@
 
 #include "convert/dor_shape.h"
 #include "convert/vel_hole_polygon_to_primitive.h"
+#include "movie/vfw_math_movie.h"
 #include "primitives/vel_math_primitive.h"
 #include "tests/support/recording_karvel.h"
 
@@ -64,4 +65,16 @@ TEST(KarvelDll, HoledShapeBuiltByTheHostIsConvertedInsideTheDll)
     CVelHolePolygonToPrimitive().TriangulateHolePolygon(&face, vertices, indices);
     EXPECT_EQ(vertices.GetSize(), 7);
     EXPECT_EQ(indices.GetSize(), 21);
+}
+
+TEST(KarvelDll, RecordersAreExported)
+{
+    _DorBitmap frame;
+    frame.info.width = frame.info.height = 4;
+    frame.bits.SetSize(48);
+    CVelMathMovie_NoComp plain;
+    CVelMathMovie compressed;
+    EXPECT_EQ(plain.Start(frame, "Z:\\no\\such\\folder\\movie.avi", 10, "m", 1), 0);
+    EXPECT_EQ(compressed.Start(frame, "Z:\\no\\such\\folder\\movie.avi", 10, "m", 1), 0);
+    EXPECT_EQ(plain.IsStart() + compressed.IsStart(), 0);
 }

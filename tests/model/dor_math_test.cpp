@@ -131,3 +131,11 @@ TEST(TruncateToInt, TowardZeroWithinIntRangeOnly)
     EXPECT_FALSE(DorTruncateToInt(-HUGE_VAL, out));
     EXPECT_EQ(out, 7);
 }
+
+TEST(DirectionAngles, AzimuthFallsBackToZeroWithoutADirection)
+{
+    EXPECT_DOUBLE_EQ(DorAzimuth(DorVector3(-2, 0, 5)), kPi);
+    EXPECT_DOUBLE_EQ(DorAzimuth(DorVector3(0, 3, 0)), kPi / 2);
+    EXPECT_EQ(DorAzimuth(DorVector3(0, 0, 4)), 0.0);        // vertical
+    EXPECT_EQ(DorAzimuth(DorVector3(0.00005, 0, 0)), 0.0);  // too short
+}

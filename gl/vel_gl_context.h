@@ -1,0 +1,29 @@
+#pragma once
+// CVelGLContext: the OpenGL rendering context of a modeller on one device context, and the
+// background colour its frames are cleared to.
+#include "model/dor_types.h"
+#include "model/export.h"
+#include "model/platform.h"
+
+class KARVEL_API CVelGLContext {
+public:
+    DorColorValue background;  // opaque black unless the host sets it
+    HGLRC handle;              // null when there is no context
+
+    CVelGLContext() : background(0, 0, 0, 1), handle(nullptr) {}
+    // A copy takes the colour only: a rendering context has one owner.
+    CVelGLContext(const CVelGLContext& other) : background(other.background), handle(nullptr) {}
+    CVelGLContext& operator=(const CVelGLContext& other)
+    {
+        background = other.background;
+        return *this;
+    }
+    virtual ~CVelGLContext();
+
+    // Chooses and sets the window pixel format on dc, then creates the context and makes it
+    // current. Any context held before is released first. Returns 1, or 0 when the pixel format
+    // cannot be chosen, set or described.
+    int Create(HDC dc);
+    // Makes no context current and deletes the one held, if any.
+    void Release();
+};

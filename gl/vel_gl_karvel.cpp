@@ -1,0 +1,150 @@
+// The modeller's operations that need no OpenGL call: the entity store, textures, lights,
+// camera, cull mode, background and offset.
+#include "gl/vel_gl_karvel.h"
+
+CVelGLKarvel::CVelGLKarvel(const CVelGLKarvel& other)
+    : CVelKarvel(other), model(other.model), renderState(nullptr), context(other.context), modelScale(other.modelScale)
+{
+}
+
+CVelGLKarvel& CVelGLKarvel::operator=(const CVelGLKarvel& other)
+{
+    if (this != &other) {
+        Finalize();
+        model = other.model;
+        context = other.context;
+        modelScale = other.modelScale;
+    }
+    return *this;
+}
+
+void CVelGLKarvel::RemoveShapeAt(_DorPosition*& position) { model.RemoveAt(position); }
+
+void CVelGLKarvel::RemoveShapeAll() { model.Destroy(); }
+
+void CVelGLKarvel::MoveDepthToTail(_DorPosition*& position) { model.MoveToTail(position); }
+
+void CVelGLKarvel::MoveDepthToHead(_DorPosition*& position) { model.MoveToHead(position); }
+
+CDorArray<long, long>* CVelGLKarvel::GetFreeProperty(_DorPosition*& position)
+{
+    CVelGLEntity* entity = CVelGLStructure::EntityAt(position);
+    return entity ? &entity->freeProperty : nullptr;
+}
+
+void CVelGLKarvel::GetCenterPoint(DorVector3& centre, int filter) { model.GetCenterPoint(centre, filter, modelScale); }
+
+void CVelGLKarvel::SetOffset(DorVector3& offset)
+{
+    model.offset.x = offset.x * modelScale;
+    model.offset.y = offset.y * modelScale;
+    model.offset.z = offset.z * modelScale;
+}
+
+void CVelGLKarvel::DeviceSetting() {}
+
+void CVelGLKarvel::GetBkColor(DorColorValue& colour) { colour = context.background; }
+
+void CVelGLKarvel::SetBkColor(DorColorValue& colour) { context.background = colour; }
+
+void CVelGLKarvel::SetCullMode(int mode)
+{
+    if (renderState)
+        renderState->cullMode = mode;
+}
+
+int CVelGLKarvel::GetCullMode() { return renderState ? renderState->cullMode : 0; }
+
+void CVelGLKarvel::GetCamera(_VelCamera& camera)
+{
+    if (renderState)
+        renderState->GetCamera(camera, modelScale);
+}
+
+void CVelGLKarvel::SetCamera(const _VelCamera& camera)
+{
+    if (renderState)
+        renderState->SetCamera(camera, modelScale);
+}
+
+void CVelGLKarvel::GetViewport(_VelViewport& viewport)
+{
+    if (renderState)
+        viewport = renderState->viewport;
+}
+
+void CVelGLKarvel::ResetViewport()
+{
+    // NOTE: only the record: glViewport and the aspect ratio wait for the next SetViewport or
+    // Initialize, which hosts rely on.
+    if (renderState)
+        renderState->viewport = renderState->resetViewport;
+}
+
+void CVelGLKarvel::GetLight(int index, DorLight& light)
+{
+    if (renderState)
+        renderState->GetLight(index, light, modelScale);
+}
+
+void CVelGLKarvel::SetLight(int index, DorLight light)
+{
+    if (renderState)
+        renderState->SetLight(index, light, modelScale);
+}
+
+void CVelGLKarvel::FollowViewportAspect()
+{
+    _VelViewport viewport = {0, 0, 0, 0};
+    GetViewport(viewport);
+    if (viewport.height == 0)
+        return;  // a minimised window: keep the last usable ratio
+    _VelCamera camera;
+    GetCamera(camera);
+    camera.aspect = static_cast<double>(viewport.width) / static_cast<double>(viewport.height);
+    SetCamera(camera);
+}
+
+_DorPosition* CVelGLKarvel::AddPrimitive(CVelPrimitive& primitive)
+{
+    CVelGLScope scope(renderState);
+    return model.AddPrimitive(primitive, scope);
+}
+
+void CVelGLKarvel::ChangePrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags)
+{
+    CVelGLScope scope(renderState);
+    model.ChangePrimitive(position, primitive, flags, scope);
+}
+
+void CVelGLKarvel::GetPrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags)
+{
+    CVelGLScope scope(renderState);
+    model.GetPrimitive(position, primitive, flags, scope);
+}
+
+void CVelGLKarvel::MoveShape(_DorPosition* position, DorMatrix4x4& matrix)
+{
+    CVelGLScope scope(renderState);
+    model.MoveEntity(position, matrix, scope);
+}
+
+long CVelGLKarvel::GetDrawMode(_DorPosition*& position)
+{
+    CVelGLEntity* entity = CVelGLStructure::EntityAt(position);
+    return entity ? entity->DrawMode : -1;
+}
+
+void CVelGLKarvel::SetDrawMode(_DorPosition*& position, long mode)
+{
+    if (CVelGLEntity* entity = CVelGLStructure::EntityAt(position))
+        entity->DrawMode = mode;
+}
+
+unsigned int CVelGLKarvel::AddTexture(_DorBitmap& bitmap) { return model.AddTexture(bitmap); }
+
+int CVelGLKarvel::ChangeTexture(unsigned int name, _DorBitmap& bitmap) { return model.ChangeTexture(name, bitmap); }
+
+void CVelGLKarvel::RemoveAllTexture() { model.RemoveAllTexture(); }
+
+CDorArray<_DorBitmap, _DorBitmap&>* CVelGLKarvel::GetTextureList() { return &model.textures; }

@@ -1,0 +1,91 @@
+#pragma once
+// CVelGLKarvel: the OpenGL modeller. It renders its entity store into one device context at a
+// time; every call must come on the thread that initialised it, while its context is current
+// (nothing but Initialize and SetCurrent makes a context current).
+//
+// Lifecycle: constructed (the store works, nothing is drawn, camera, light, viewport and cull
+// operations do nothing) -> Initialize -> live -> Finalize (or the destructor) -> constructed
+// with an empty model. The texture list survives every step.
+//
+// The store operations are in vel_gl_karvel.cpp, context lifecycle in wgl_karvel.cpp, the frame
+// in gl_draw.cpp.
+#include "gl/vel_gl_context.h"
+#include "gl/vel_gl_render_state.h"
+#include "gl/vel_gl_store.h"
+#include "gl/vel_karvel.h"
+
+class KARVEL_API CVelGLKarvel : public CVelKarvel {
+public:
+    CVelGLStructure model;
+    CVelGLRenderState* renderState;  // null until the first successful Initialize; owned
+    CVelGLContext context;
+    double modelScale;  // camera, light positions and offset are kept multiplied by it
+
+    CVelGLKarvel();
+    // A copy takes the model, textures, background and scale, and starts uninitialised.
+    CVelGLKarvel(const CVelGLKarvel& other);
+    CVelGLKarvel& operator=(const CVelGLKarvel& other);
+    ~CVelGLKarvel() override;
+
+    int Initialize(HDC& dc, _VelViewport viewport) override;
+    int Initialize(HDC& dc) override;
+    void Finalize() override;
+    HDC SetCurrent(HDC& dc) override;
+    HDC GetCurrent() override;
+    void RemoveShapeAt(_DorPosition*& position) override;
+    void RemoveShapeAll() override;
+    void MoveDepthToTail(_DorPosition*& position) override;
+    void MoveDepthToHead(_DorPosition*& position) override;
+    CDorArray<long, long>* GetFreeProperty(_DorPosition*& position) override;
+    void GetCenterPoint(DorVector3& centre, int filter) override;
+    void SetOffset(DorVector3& offset) override;
+    void DrawModel(HDC& dc) override;
+    void DeviceSetting() override;
+    void GetBkColor(DorColorValue& colour) override;
+    void SetBkColor(DorColorValue& colour) override;
+    void SetCullMode(int mode) override;
+    int GetCullMode() override;
+    void GetCamera(_VelCamera& camera) override;
+    void SetCamera(const _VelCamera& camera) override;
+    void GetViewport(_VelViewport& viewport) override;
+    void SetViewport(_VelViewport& viewport) override;
+    void ResetViewport() override;
+    void GetLight(int index, DorLight& light) override;
+    void SetLight(int index, DorLight light) override;
+    _DorPosition* AddPrimitive(CVelPrimitive& primitive) override;
+    void ChangePrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags) override;
+    void GetPrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags) override;
+    unsigned int AddTexture(_DorBitmap& bitmap) override;
+    int ChangeTexture(unsigned int name, _DorBitmap& bitmap) override;
+    void RemoveAllTexture() override;
+    CDorArray<_DorBitmap, _DorBitmap&>* GetTextureList() override;
+
+    // On the GL copy directly: normals turn without translation and are renormalised.
+    void MoveShape(_DorPosition* position, DorMatrix4x4& matrix);
+    // The entity's DrawMode, or -1 when the handle holds no entity.
+    long GetDrawMode(_DorPosition*& position);
+    void SetDrawMode(_DorPosition*& position, long mode);
+
+protected:
+    // Pieces of a frame, for every pass that renders the model (drawing, picking, capture).
+    // Context start-up: device hook, lights, fixed state, both viewports.
+    void StartUpContext();
+    // Generates texture names 1..n for the texture list and uploads the images.
+    void UploadTextures();
+    // Sets the camera's aspect ratio from the viewport in force.
+    void FollowViewportAspect();
+    // Camera projection and view, the model offset, lights, line and colour resets, cull mode.
+    void SetUpScene();
+    // Two-sided mode turns culling off and lights both sides; otherwise back faces are culled.
+    void ApplyCullMode();
+    // Culling on and the vertex and normal arrays enabled, as every entity pass needs.
+    void BeginEntityPass();
+    void DrawEntity(const CVelGLEntity& entity);
+    void DrawGroup(const CVelGLTrianglePolygons& group);
+
+private:
+    // The re-creation of the context on dc shared by both Initialize forms; viewport may be null.
+    int InitializeOn(HDC dc, const _VelViewport* viewport);
+    void DrawArrays(const CVelGLTrianglePolygons& group);
+    void DrawImmediate(const CVelGLTrianglePolygons& group);
+};

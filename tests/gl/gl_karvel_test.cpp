@@ -1,0 +1,611 @@
+// The OpenGL modeller in real windows: what a host sees after DrawModel, read back from the
+// front buffer.
+#include <gtest/gtest.h>
+#include <windows.h>
+#include <GL/gl.h>
+
+#include <cmath>
+#include <utility>
+
+#include "camera/vel_math_camera.h"
+#include "convert/dor_shape.h"
+#include "gl/vel_gl_karvel.h"
+#include "model/dor_math.h"
+#include "support/win32_test_window.h"
+
+namespace {
+const int kWidth = 160;
+const int kHeight = 120;
+
+struct Rgb {
+    int r, g, b;
+};
+
+// The pixel at col, row (row 0 at the top) of the last presented frame.
+Rgb PixelAt(int col, int row)
+{
+    glFinish();
+    // NOTE: under Wine the front buffer reads back as zeros; Mesa swaps by copying, so the back
+    // buffer still holds the presented frame.
+    glReadBuffer(GL_BACK);
+    GLint viewport[4];
+    glGetIntegerv(GL_VIEWPORT, viewport);
+    unsigned char rgba[4] = {};
+    HWND window = WindowFromDC(wglGetCurrentDC());
+    RECT client;
+    GetClientRect(window, &client);
+    glReadPixels(col, client.bottom - 1 - row, 1, 1, GL_RGBA, GL_UNSIGNED_BYTE, rgba);
+    return Rgb{rgba[0], rgba[1], rgba[2]};
+}
+
+bool IsBackground(const Rgb& c) { return c.r == 0 && c.g == 0 && c.b == 0; }
+
+_DorMaterial Matte(float r, float g, float b, float alpha = 1)
+{
+    _DorMaterial m;
+    m.diffuse = DorColorValue(r, g, b, alpha);
+    m.ambient = DorColorValue(r, g, b, 1);
+    m.specular = DorColorValue(0, 0, 0, 1);
+    m.emission = DorColorValue(0, 0, 0, 1);
+    m.shininess = 0;
+    return m;
+}
+
+void AddVertex(CVelTrianglePolys& g, double x, double y, double z, double s = 0, double t = 0)
+{
+    _VelVertex v;
+    v.position = DorVector3(x, y, z);
+    v.normal = DorVector3(0, -1, 0);
+    v.texcoord = DorVector2(s, t);
+    g.vertices.Add(v);
+}
+
+// A rectangle facing the camera (counter-clockwise seen from -y) in the plane at depth y,
+// spanning x0..x1 and z0..z1, as a triangle strip with texture coordinates 0..1.
+CVelPrimitive Rectangle(double x0, double z0, double x1, double z1, double y, const _DorMaterial& material)
+{
+    CVelTrianglePolys g;
+    g.GroupType = VelGroupTriangleStrip;
+    g.material = material;
+    AddVertex(g, x0, y, z0, 0, 0);
+    AddVertex(g, x1, y, z0, 1, 0);
+    AddVertex(g, x0, y, z1, 0, 1);
+    AddVertex(g, x1, y, z1, 1, 1);
+    CVelPrimitive p;
+    p.groups.Add(g);
+    return p;
+}
+
+// A 24-bit bitmap of width texels in one row: black on the left half, white on the right.
+_DorBitmap HalfWhite(int width)
+{
+    _DorBitmap b;
+    b.info.width = width;
+    b.info.height = 1;
+    b.info.bitCount = 24;
+    b.bits.SetSize(DorBitmapRowBytes(width, 24));
+    for (int i = width / 2 * 3; i < width * 3; ++i)
+        b.bits[i] = 255;
+    return b;
+}
+// Puts the camera 10 units in front of the origin on -y, looking along +y with a 90 degree
+// field of view: x to the right, z up.
+void LookAlongY(CVelGLKarvel& karvel)
+{
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    camera.eye = DorVector3(0, -10, 0);
+    camera.target = DorVector3(0, 0, 0);
+    camera.fovy = 90;
+    camera.zNear = 1;
+    camera.zFar = 1000;
+    karvel.SetCamera(camera);
+}
+}  // namespace
+
+// A modeller live in a 160 x 120 window, its camera along +y (LookAlongY).
+class LiveModeller : public ::testing::Test {
+protected:
+    // One window for the suite: creating one under Wine takes about two seconds.
+    static void SetUpTestSuite() { shared = new TestWindow(kWidth, kHeight); }
+    static void TearDownTestSuite()
+    {
+        delete shared;
+        shared = nullptr;
+    }
+
+    void SetUp() override
+    {
+        ASSERT_EQ(karvel.Initialize(window.dc), 1);
+        ASSERT_NE(karvel.GetCurrent(), nullptr);
+        LookAlongY(karvel);
+    }
+
+    void TearDown() override { karvel.Finalize(); }
+
+    // Where the camera maths puts model point (x, y, z): column and row from the top-left.
+    static void PixelOf(double x, double y, double z, int& col, int& row)
+    {
+        double distance = 10 + y;
+        double halfHeight = distance * std::tan(45.0 / 180.0 * 3.14159265358979323846);
+        col = static_cast<int>(kWidth / 2.0 + x / halfHeight * kHeight / 2.0);
+        row = static_cast<int>(kHeight / 2.0 - z / halfHeight * kHeight / 2.0);
+    }
+
+    Rgb Draw(double x, double y, double z)
+    {
+        karvel.DrawModel(window.dc);
+        int col, row;
+        PixelOf(x, y, z, col, row);
+        return PixelAt(col, row);
+    }
+
+    _DorPosition* Add(CVelPrimitive p) { return karvel.AddPrimitive(p); }
+
+    static TestWindow* shared;
+    TestWindow& window = *shared;
+    CVelGLKarvel karvel;
+};
+
+TestWindow* LiveModeller::shared = nullptr;
+
+TEST_F(LiveModeller, ClearsToTheBackgroundColour)
+{
+    DorColorValue colour(0.2f, 0.4f, 0.6f, 0.25f);
+    karvel.SetBkColor(colour);
+    Rgb c = Draw(0, 0, 0);
+    EXPECT_NEAR(c.r, 51, 1);
+    EXPECT_NEAR(c.g, 102, 1);
+    EXPECT_NEAR(c.b, 153, 1);
+    DorColorValue back;
+    karvel.GetBkColor(back);
+    EXPECT_EQ(back.a, 0.25f);  // kept as given; frames clear opaque
+}
+
+TEST_F(LiveModeller, LitRectangleAppearsWhereTheCameraMathsPutsIt)
+{
+    Add(Rectangle(2, 1, 5, 4, 0, Matte(1, 0, 0)));
+    Rgb inside = Draw(3.5, 0, 2.5);
+    EXPECT_GT(inside.r, 150);
+    EXPECT_LT(inside.g, 30);
+    // Just outside each edge, and on the mirror images a flipped axis would give.
+    EXPECT_TRUE(IsBackground(Draw(1.7, 0, 2.5)));
+    EXPECT_TRUE(IsBackground(Draw(5.3, 0, 2.5)));
+    EXPECT_TRUE(IsBackground(Draw(3.5, 0, 0.7)));
+    EXPECT_TRUE(IsBackground(Draw(3.5, 0, 4.3)));
+    EXPECT_TRUE(IsBackground(Draw(-3.5, 0, 2.5)));
+    EXPECT_TRUE(IsBackground(Draw(3.5, 0, -2.5)));
+}
+
+TEST_F(LiveModeller, TriangleFacingASlopedCameraAppearsWhereTheViewMatrixPutsIt)
+{
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    camera.eye = DorVector3(6, -8, 5);
+    camera.target = DorVector3(1, 1, 0);
+    camera.fovy = 40;
+    karvel.SetCamera(camera);
+    karvel.GetCamera(camera);
+    DorMatrix4x4 view;
+    CVelMathMatrix::GetToViewMatrix(camera, 0, view);
+    // The world directions that the view turns onto screen right and screen up.
+    DorVector3 right(view.m[0][0], view.m[1][0], view.m[2][0]);
+    DorVector3 up(view.m[0][1], view.m[1][1], view.m[2][1]);
+    DorVector3 towardsEye = camera.eye - camera.target;
+    DorNormalize(towardsEye);
+
+    const DorVector3& centre = camera.target;
+    DorVector3 corners[] = {centre - right * 1.5 - up * 1.5, centre + right * 1.5 - up * 1.5, centre + up * 1.5};
+    CVelTrianglePolys g;
+    g.GroupType = VelGroupTriangles;
+    g.material = Matte(1, 0, 0);
+    for (const DorVector3& c : corners) {
+        AddVertex(g, c.x, c.y, c.z);
+        g.vertices[g.vertices.GetSize() - 1].normal = towardsEye;
+    }
+    CVelPrimitive p;
+    p.groups.Add(g);
+    Add(p);
+    karvel.DrawModel(window.dc);
+
+    // Perspective division of the view coordinates, one pixel per kHeight / 2 of the tangent.
+    double t = std::tan(camera.fovy / 2 / 180 * 3.14159265358979323846);
+    auto pixel = [&](const DorVector3& world) {
+        DorVector3 v = DorTransformPoint(world, view);
+        double scale = kHeight / 2.0 / (-v.z * t);
+        return PixelAt(static_cast<int>(kWidth / 2.0 + v.x * scale), static_cast<int>(kHeight / 2.0 - v.y * scale));
+    };
+    EXPECT_GT(pixel(centre).r, 150);
+    EXPECT_GT(pixel(centre - up * 1.2).r, 150);
+    EXPECT_TRUE(IsBackground(pixel(centre + right * 2)));
+    EXPECT_TRUE(IsBackground(pixel(centre - right * 2)));
+    EXPECT_TRUE(IsBackground(pixel(centre + up * 2)));
+    EXPECT_TRUE(IsBackground(pixel(centre - up * 2)));
+}
+
+TEST_F(LiveModeller, OffsetMovesCameraAndSceneTogether)
+{
+    // The camera is kept in model coordinates, so the offset never shifts the picture.
+    Add(Rectangle(2, 1, 5, 4, 0, Matte(1, 0, 0)));
+    DorVector3 offset(100, -40, 7);
+    karvel.SetOffset(offset);
+    EXPECT_EQ(karvel.model.offset.x, 100.0);
+    EXPECT_GT(Draw(3.5, 0, 2.5).r, 150);
+    EXPECT_TRUE(IsBackground(Draw(1.7, 0, 2.5)));
+    EXPECT_TRUE(IsBackground(Draw(-3.5, 0, -2.5)));
+}
+
+TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
+{
+    karvel.Finalize();
+    HDC dc = window.dc;
+    _VelViewport quarter = {0, 0, kWidth / 2, kHeight / 2};
+    ASSERT_EQ(karvel.Initialize(dc, quarter), 1);
+    GLint gl[4];
+    glGetIntegerv(GL_VIEWPORT, gl);
+    EXPECT_EQ(gl[2], kWidth / 2);
+    EXPECT_EQ(gl[3], kHeight / 2);
+    _VelViewport now;
+    karvel.GetViewport(now);
+    EXPECT_EQ(now.width, kWidth / 2);
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
+    LookAlongY(karvel);
+    Add(Rectangle(-1, -1, 1, 1, 0, Matte(0, 1, 0)));
+    karvel.DrawModel(dc);
+    EXPECT_GT(PixelAt(kWidth / 4, kHeight * 3 / 4).g, 150);  // centre of the lower-left quarter
+    EXPECT_TRUE(IsBackground(PixelAt(kWidth / 2, kHeight / 2)));
+}
+
+TEST_F(LiveModeller, EachLineGroupSetsItsOwnWidth)
+{
+    // Vertical segments through the centres of pixel columns 80 and 100 (6 pixels per unit).
+    CVelPrimitive p;
+    const double columns[] = {80.5, 100.5};
+    const float widths[] = {3, 1};
+    for (int i = 0; i < 2; ++i) {
+        CVelTrianglePolys g;
+        g.GroupType = VelGroupLines;
+        g.lineWidth = widths[i];
+        g.material = Matte(1, 1, 1);
+        double x = (columns[i] - kWidth / 2.0) / 6;
+        AddVertex(g, x, 0, -3);
+        AddVertex(g, x, 0, 3);
+        p.groups.Add(g);
+    }
+    Add(p);
+    karvel.DrawModel(window.dc);
+    const int row = kHeight / 2 + 5;
+    EXPECT_TRUE(IsBackground(PixelAt(78, row)));
+    for (int col = 79; col <= 81; ++col)
+        EXPECT_GT(PixelAt(col, row).r, 150) << col;
+    EXPECT_TRUE(IsBackground(PixelAt(82, row)));
+    EXPECT_TRUE(IsBackground(PixelAt(99, row)));
+    EXPECT_GT(PixelAt(100, row).r, 150);
+    EXPECT_TRUE(IsBackground(PixelAt(101, row)));
+}
+
+TEST_F(LiveModeller, ExtrudedBoxAddedAsAShapeIsDrawnSolid)
+{
+    const DorVector3 square[] = {DorVector3(-2, -2, -2), DorVector3(2, -2, -2), DorVector3(2, 2, -2),
+                                 DorVector3(-2, 2, -2)};
+    CDorExtruded box(CDorPolygon(square, 4), DorVector3(0, 0, 4));
+    box.SetMaterial(Matte(1, 0, 0));
+    box.MatchCapsToWalls();
+    CDorShape shape;
+    shape.Add(&box);
+    ASSERT_NE(karvel.AddShape(shape), nullptr);
+    EXPECT_GT(Draw(0, -2, 0).r, 150);  // the front wall faces the camera
+    EXPECT_GT(Draw(1.8, -2, 1.8).r, 150);
+    EXPECT_TRUE(IsBackground(Draw(2.5, -2, 0)));
+    EXPECT_TRUE(IsBackground(Draw(0, -2, 2.5)));
+}
+
+TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
+{
+    _DorPosition* rect = Add(Rectangle(-2, -2, 2, 2, 0, Matte(0, 1, 0)));
+    const long hidden[] = {1, 3};
+    for (long mode : hidden) {
+        karvel.SetDrawMode(rect, mode);
+        EXPECT_TRUE(IsBackground(Draw(0, 0, 0))) << "DrawMode " << mode;
+    }
+    const long shown[] = {0, 2};
+    for (long mode : shown) {
+        karvel.SetDrawMode(rect, mode);
+        EXPECT_GT(Draw(0, 0, 0).g, 150) << "DrawMode " << mode;
+    }
+    EXPECT_EQ(karvel.GetDrawMode(rect), 2);
+}
+
+TEST_F(LiveModeller, ListOrderDecidesOverlapAtEqualDepth)
+{
+    _DorPosition* red = Add(Rectangle(-2, -2, 2, 2, 0, Matte(1, 0, 0)));
+    Add(Rectangle(-2, -2, 2, 2, 0, Matte(0, 1, 0)));
+    Rgb first = Draw(0, 0, 0);
+    EXPECT_GT(first.r, 150);
+    EXPECT_LT(first.g, 30);
+    karvel.MoveDepthToTail(red);
+    Rgb second = Draw(0, 0, 0);
+    EXPECT_GT(second.g, 150);
+    EXPECT_LT(second.r, 30);
+}
+
+TEST_F(LiveModeller, TransparentGroupBlendsAndLeavesDepthUnwritten)
+{
+    Add(Rectangle(-4, -4, 4, 4, 5, Matte(0, 0, 1)));        // far, opaque blue
+    Add(Rectangle(-2, -2, 2, 2, 0, Matte(1, 0, 0, 0.5f)));  // near, half-transparent red
+    Rgb blended = Draw(0, 0, 0);
+    EXPECT_GT(blended.r, 60);
+    EXPECT_GT(blended.b, 40);
+    // Green behind the red one but drawn after it still shows: the red wrote no depth.
+    Add(Rectangle(-1, -1, 1, 1, 2, Matte(0, 1, 0)));
+    Rgb behind = Draw(0, 0, 0);
+    EXPECT_GT(behind.g, 150);
+    EXPECT_LT(behind.r, 30);
+}
+
+TEST_F(LiveModeller, OverlayGroupIsPlacedInWindowPixelsUnlit)
+{
+    CVelTrianglePolys dot;
+    dot.GroupType = VelGroupPoints;
+    dot.OverlayFlag = 1;
+    dot.lineWidth = 3;
+    dot.material = Matte(0, 0, 0);
+    dot.material.ambient = DorColorValue(0, 1, 0, 1);
+    AddVertex(dot, 10, 20, 0);
+    CVelPrimitive p;
+    p.groups.Add(dot);
+    Add(p);
+    karvel.DrawModel(window.dc);
+    Rgb at = PixelAt(10, 20);
+    EXPECT_EQ(at.g, 255);
+    EXPECT_EQ(at.r, 0);
+    EXPECT_TRUE(IsBackground(PixelAt(14, 20)));
+    EXPECT_TRUE(IsBackground(PixelAt(10, 24)));
+    EXPECT_TRUE(IsBackground(PixelAt(kWidth - 10, 20)));
+    EXPECT_TRUE(IsBackground(PixelAt(10, kHeight - 20)));
+}
+
+TEST_F(LiveModeller, PerVertexColourIsDrawnImmediately)
+{
+    CVelPrimitive p = Rectangle(-3, -3, 3, 3, 0, Matte(0, 0, 0));
+    CVelTrianglePolys& g = p.groups[0];
+    g.RenderKind = VelRenderVertexColour;
+    for (int i = 0; i < g.vertices.GetSize(); ++i)
+        g.vertices[i].colour = DorColorValue(0, 0, 1, 1);
+    Add(p);
+    Rgb c = Draw(0, 0, 0);
+    EXPECT_GT(c.b, 30);  // the vertex colour, through the ambient terms only
+    EXPECT_LT(c.r, 5);
+}
+
+TEST_F(LiveModeller, BackFacesStayCulledForEntitiesInBothCullModes)
+{
+    CVelPrimitive p = Rectangle(-2, -2, 2, 2, 0, Matte(1, 1, 0));
+    std::swap(p.groups[0].vertices[1], p.groups[0].vertices[2]);  // clockwise: a back face
+    Add(p);
+    EXPECT_EQ(karvel.GetCullMode(), 0);
+    EXPECT_TRUE(IsBackground(Draw(0, 0, 0)));
+    karvel.SetCullMode(5);
+    EXPECT_EQ(karvel.GetCullMode(), 5);
+    EXPECT_TRUE(IsBackground(Draw(0, 0, 0)));
+    GLint twoSided = 0;
+    glGetIntegerv(GL_LIGHT_MODEL_TWO_SIDE, &twoSided);
+    EXPECT_EQ(twoSided, 1);
+}
+
+TEST_F(LiveModeller, IndicesOutsideTheVerticesAreNeverDrawn)
+{
+    CVelPrimitive p = Rectangle(-2, -2, 2, 2, 0, Matte(1, 0, 0));
+    CVelTrianglePolys bad = p.groups[0];
+    bad.GroupType = VelGroupIndexed;
+    _VelTriangleIndex t(0, 1, 4000000);
+    bad.triangles.Add(t);
+    CVelTrianglePolys wrapped = bad;
+    wrapped.triangles[0] = _VelTriangleIndex(0, -1, 2);
+    p.groups.Add(bad);
+    p.groups.Add(wrapped);
+    p.groups[0].material = Matte(0, 1, 0);
+    Add(p);
+    Rgb c = Draw(0, 0, 0);
+    EXPECT_GT(c.g, 150);  // the valid group still draws
+}
+
+TEST_F(LiveModeller, TexturedRectangleShowsItsTexture)
+{
+    _DorBitmap texture = HalfWhite(4);
+    karvel.Finalize();
+    ASSERT_EQ(karvel.AddTexture(texture), 1u);
+    HDC dc = window.dc;
+    ASSERT_EQ(karvel.Initialize(dc), 1);
+    LookAlongY(karvel);
+    DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
+    karvel.SetBkColor(grey);
+
+    CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
+    p.groups[0].RenderKind = VelRenderTextured;
+    p.groups[0].texture = 1;
+    Add(p);
+    // The texture environment blends: black texels show the lit colour, white ones black.
+    Rgb left = Draw(-2, 0, 0);
+    Rgb right = Draw(2, 0, 0);
+    EXPECT_GT(left.r, 150);
+    EXPECT_LT(right.r, 20);
+    EXPECT_LT(right.g, 20);
+}
+
+TEST_F(LiveModeller, ResetViewportLeavesTheGLViewportUntilSetViewport)
+{
+    _VelViewport quarter = {0, 0, kWidth / 2, kHeight / 2};
+    karvel.SetViewport(quarter);
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
+    karvel.ResetViewport();
+    _VelViewport now;
+    karvel.GetViewport(now);
+    EXPECT_EQ(now.width, kWidth);
+    EXPECT_EQ(now.height, kHeight);
+    karvel.DrawModel(window.dc);
+    GLint gl[4];
+    glGetIntegerv(GL_VIEWPORT, gl);
+    EXPECT_EQ(gl[2], kWidth / 2);
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
+}
+
+TEST_F(LiveModeller, LightZeroFollowsTheCameraAtEveryFrame)
+{
+    DorLight light;
+    karvel.GetLight(0, light);
+    light.position = DorVector3(7, 7, 7);
+    light.diffuse = DorColorValue(0.5f, 0.5f, 0.5f, 1);
+    karvel.SetLight(0, light);
+    karvel.DrawModel(window.dc);
+    DorLight now;
+    karvel.GetLight(0, now);
+    EXPECT_NEAR(now.position.y, -10, 1e-6);
+    EXPECT_NEAR(now.position.x, 0, 1e-6);
+    EXPECT_NEAR(now.direction.y, 1, 1e-6);  // it shines along the view
+    EXPECT_EQ(now.diffuse.r, 0.5f);
+    DorLight untouched;
+    untouched.type = 9;
+    karvel.GetLight(-1, untouched);
+    karvel.GetLight(8, untouched);
+    EXPECT_EQ(untouched.type, 9);
+}
+
+TEST(ModellerLifecycle, UninitialisedModellerKeepsItsStoreAndRefusesSceneCalls)
+{
+    CVelGLKarvel karvel;
+    karvel.Finalize();
+    karvel.Finalize();
+    EXPECT_EQ(karvel.GetCullMode(), 0);
+    karvel.SetCullMode(5);
+    EXPECT_EQ(karvel.GetCullMode(), 0);
+    _VelCamera camera = {};
+    camera.fovy = 33;
+    karvel.GetCamera(camera);
+    EXPECT_EQ(camera.fovy, 33);
+    TestWindow window(kWidth, kHeight);
+    HDC dc = window.dc;
+    EXPECT_EQ(karvel.SetCurrent(dc), dc);
+    EXPECT_EQ(karvel.renderState, nullptr);
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    _DorPosition* handle = karvel.AddPrimitive(p);
+    EXPECT_NE(handle, nullptr);
+    EXPECT_NE(karvel.GetFreeProperty(handle), nullptr);
+    _DorPosition* none = nullptr;
+    EXPECT_EQ(karvel.GetFreeProperty(none), nullptr);
+    EXPECT_EQ(karvel.GetDrawMode(none), -1);
+}
+
+TEST(ModellerStore, TheTwoMoveShapesTreatNormalsDifferently)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    _DorPosition* own = karvel.AddPrimitive(p);
+    _DorPosition* base = karvel.AddPrimitive(p);
+    DorMatrix4x4 shift = DorTranslate(10, 0, 0);
+    karvel.MoveShape(own, shift);
+    static_cast<CVelKarvel&>(karvel).MoveShape(base, shift);
+    CVelPrimitive a, b;
+    karvel.GetPrimitive(own, a, 1);
+    karvel.GetPrimitive(base, b, 1);
+    EXPECT_EQ(a.groups[0].vertices[1].position.x, 11.0);
+    EXPECT_EQ(b.groups[0].vertices[1].position.x, 11.0);
+    // The modeller's own turns the normal only; the interface's translates it too.
+    EXPECT_FLOAT_EQ(a.groups[0].vertices[1].normal.y, -1);
+    EXPECT_NEAR(b.groups[0].vertices[1].normal.x, 10 / std::sqrt(101.0), 1e-6);
+}
+
+TEST(ModellerStore, CopyTakesTheModelAndStartsUninitialised)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    karvel.AddPrimitive(p);
+    DorColorValue blue(0, 0, 1, 1);
+    karvel.SetBkColor(blue);
+    TestWindow window(kWidth, kHeight);
+    HDC dc = window.dc;
+    ASSERT_EQ(karvel.Initialize(dc), 1);
+    karvel.AddPrimitive(p);
+    CVelGLKarvel copy(karvel);
+    EXPECT_EQ(copy.renderState, nullptr);
+    EXPECT_EQ(copy.context.handle, nullptr);
+    EXPECT_EQ(copy.model.entities.GetCount(), 1);
+    DorColorValue colour;
+    copy.GetBkColor(colour);
+    EXPECT_EQ(colour.b, 1.0f);
+    copy = copy;
+    EXPECT_EQ(copy.model.entities.GetCount(), 1);
+}
+
+TEST(ModellerLifecycle, FirstInitializeStartsFromAnEmptyModelAndKeepsTextures)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    karvel.AddPrimitive(p);
+    _DorBitmap texture = HalfWhite(4);
+    karvel.AddTexture(texture);
+    TestWindow window(kWidth, kHeight);
+    HDC dc = window.dc;
+    ASSERT_EQ(karvel.Initialize(dc), 1);
+    EXPECT_EQ(karvel.model.entities.GetCount(), 0);
+    EXPECT_EQ(karvel.GetTextureList()->GetSize(), 1);
+    EXPECT_TRUE(glIsTexture(1));
+}
+
+TEST(ModellerLifecycle, MovesToASecondWindowWithModelTexturesAndCamera)
+{
+    TestWindow first(kWidth, kHeight);
+    TestWindow second(2 * kWidth, kHeight);
+    CVelGLKarvel karvel;
+    HDC dc1 = first.dc;
+    HDC dc2 = second.dc;
+    _DorBitmap texture = HalfWhite(4);
+    karvel.AddTexture(texture);
+    ASSERT_EQ(karvel.Initialize(dc1), 1);
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 120.0);
+    LookAlongY(karvel);
+    CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
+    p.groups[0].RenderKind = VelRenderTextured;
+    p.groups[0].texture = 1;
+    karvel.AddPrimitive(p);
+    HGLRC firstContext = karvel.context.handle;
+
+    EXPECT_EQ(karvel.SetCurrent(dc1), dc1);  // already current: nothing is re-created
+    EXPECT_EQ(karvel.context.handle, firstContext);
+
+    EXPECT_EQ(karvel.SetCurrent(dc2), dc1);
+    EXPECT_EQ(karvel.GetCurrent(), dc2);
+    _VelViewport viewport;
+    karvel.GetViewport(viewport);
+    EXPECT_EQ(viewport.width, kWidth);  // the viewport travels with the modeller
+    _VelCamera moved;
+    karvel.GetCamera(moved);
+    EXPECT_EQ(moved.eye.y, -10);
+    EXPECT_DOUBLE_EQ(moved.aspect, 160.0 / 120.0);
+    karvel.DrawModel(dc2);
+    EXPECT_GT(PixelAt(68, 60).r, 150);  // the black texels show the lit red
+    EXPECT_LT(PixelAt(92, 60).r, 20);   // the white ones blend it away
+
+    // Initialising on the second window takes its viewport and aspect ratio.
+    ASSERT_EQ(karvel.Initialize(dc2), 1);
+    karvel.GetViewport(viewport);
+    EXPECT_EQ(viewport.width, 2 * kWidth);
+    karvel.GetCamera(moved);
+    EXPECT_DOUBLE_EQ(moved.aspect, 320.0 / 120.0);
+    EXPECT_EQ(karvel.model.entities.GetCount(), 1);
+    EXPECT_TRUE(glIsTexture(1));
+    karvel.DrawModel(dc2);
+    EXPECT_GT(PixelAt(148, 60).r, 150);
+    EXPECT_LT(PixelAt(172, 60).r, 20);
+
+    EXPECT_EQ(karvel.SetCurrent(dc1), dc2);  // and back
+    karvel.DrawModel(dc1);
+    EXPECT_EQ(karvel.GetCurrent(), dc1);
+}
