@@ -46,13 +46,9 @@ protected:
     void SetUp() override
     {
         ASSERT_EQ(karvel.Initialize(window.dc), 1);
-        _VelCamera camera;
-        karvel.GetCamera(camera);
-        camera.eye = DorVector3(0, -10, 0);
-        camera.target = DorVector3(0, 0, 0);
-        camera.fovy = 90;
-        camera.zNear = 1;
-        camera.zFar = 1000;
+        _VelCamera current;
+        karvel.GetCamera(current);
+        _VelCamera camera = {DorVector3(0, -10, 0), DorVector3(0, 0, 0), 90, 1, 1000, current.aspect};
         karvel.SetCamera(camera);
     }
     void TearDown() override { karvel.Finalize(); }
