@@ -25,7 +25,8 @@ void OrientOutlines(CDorHoleExtruded& extruded, const DorVector3& direction)
     VelOrientProfile(extruded.top.points, direction);
 }
 
-// The walls between two loops into walls[0..count-1], anchored at the bottom loop's point 0.
+// One wall per bottom point between two loops of the same count, into walls[0..], every
+// texture frame anchored at the bottom loop's point 0.
 // Outline walls run top, bottom, top, bottom; hole walls the other way round, so that they face
 // into a hole that runs the outline's way.
 void FillSolidWalls(const CDorHoleExtruded& extruded, const DorPointArray& bottomPoints,

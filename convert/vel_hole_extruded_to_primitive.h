@@ -24,6 +24,7 @@ protected:
     // running the outline's way gets walls facing into it.
     void ConvertSolidHoleExtruded(CDorHoleExtruded* extruded, CVelGroupArray& groups);
     // The outline's side edges and loops, then those of every hole pair. A hole's side lines
-    // shade like its solid walls: facing into a hole that runs the outline's way.
+    // shade like its solid walls (their corner normals turned round: facing into a hole that
+    // runs the outline's way); its loops shade like the caps around it, as the outline's do.
     void ConvertWireHoleExtruded(CDorHoleExtruded* extruded, CVelGroupArray& groups);
 };
