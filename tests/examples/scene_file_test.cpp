@@ -150,7 +150,7 @@ TEST_F(SceneFileTest, ProfilesRunCounterClockwiseAboutTheExtrusion)
 
 // A wall standing in the x-z plane with a door given clockwise and a window given
 // counter-clockwise (seen from -y): both end up running the outline's way round.
-class WallWithOpenings : public SceneFileTest {
+class SceneWallWithOpenings : public SceneFileTest {
 protected:
     CDorHoleExtruded* wall = nullptr;
 
@@ -167,7 +167,7 @@ protected:
     }
 };
 
-TEST_F(WallWithOpenings, HolesRunTheOutlinesWayRound)
+TEST_F(SceneWallWithOpenings, HolesRunTheOutlinesWayRound)
 {
     DorVector3 outline = DorNewellNormal(wall->bottom.points.GetData(), wall->bottom.points.GetSize());
     ASSERT_EQ(wall->bottom.holes.GetSize(), 2);
@@ -178,7 +178,7 @@ TEST_F(WallWithOpenings, HolesRunTheOutlinesWayRound)
     }
 }
 
-TEST_F(WallWithOpenings, TopHolesAreTheBottomHolesMoved)
+TEST_F(SceneWallWithOpenings, TopHolesAreTheBottomHolesMoved)
 {
     ASSERT_EQ(wall->top.holes.GetSize(), 2);
     for (int h = 0; h < 2; ++h)
