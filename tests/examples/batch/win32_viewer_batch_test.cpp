@@ -57,6 +57,88 @@ ViewerRun RunViewer(const std::string& arguments)
 
 std::string Quoted(const std::string& path) { return "\"" + path + "\""; }
 
+// The viewer opened in a window by a test, its files written into folder; the test drives it
+// with the messages a user's mouse and keyboard would send.
+class OpenViewer {
+public:
+    OpenViewer(const std::string& arguments, const std::string& folder)
+    {
+        STARTUPINFOA startup = {};
+        startup.cb = sizeof(startup);
+        std::string command = std::string("\"") + KARVEL_VIEWER_EXE + "\" " + arguments;
+        if (!CreateProcessA(nullptr, &command[0], nullptr, nullptr, FALSE, 0, nullptr, folder.c_str(), &startup,
+                            &process_))
+            return;
+        for (int tries = 0; tries < 200 && !frame; ++tries) {
+            Sleep(50);
+            EnumWindows(&OpenViewer::FindFrame, reinterpret_cast<LPARAM>(this));
+        }
+        view = FindWindowExA(frame, nullptr, "KarvelViewerView", nullptr);
+        status = FindWindowExA(frame, nullptr, "msctls_statusbar32", nullptr);
+    }
+    ~OpenViewer()
+    {
+        if (!process_.hProcess)
+            return;
+        if (WaitForSingleObject(process_.hProcess, 0) == WAIT_TIMEOUT)
+            TerminateProcess(process_.hProcess, 3);
+        CloseHandle(process_.hProcess);
+        CloseHandle(process_.hThread);
+    }
+
+    // Sent, not posted: each message is handled before the next one is sent.
+    void Mouse(UINT message, WPARAM keys, int x, int y) { SendMessageA(view, message, keys, MAKELPARAM(x, y)); }
+    void Key(WPARAM key) { SendMessageA(view, WM_KEYDOWN, key, 0); }
+    std::string StatusText()
+    {
+        char text[512] = {};
+        SendMessageA(status, WM_GETTEXT, sizeof text, reinterpret_cast<LPARAM>(text));
+        return text;
+    }
+    DWORD Close()
+    {
+        SendMessageA(frame, WM_CLOSE, 0, 0);
+        DWORD code = ~0u;
+        if (WaitForSingleObject(process_.hProcess, 20000) == WAIT_OBJECT_0)
+            GetExitCodeProcess(process_.hProcess, &code);
+        return code;
+    }
+
+    HWND frame = nullptr, view = nullptr, status = nullptr;
+
+private:
+    PROCESS_INFORMATION process_ = {};
+
+    static BOOL CALLBACK FindFrame(HWND hwnd, LPARAM self)
+    {
+        auto* viewer = reinterpret_cast<OpenViewer*>(self);
+        DWORD owner = 0;
+        GetWindowThreadProcessId(hwnd, &owner);
+        char name[64] = {};
+        GetClassNameA(hwnd, name, sizeof name);
+        if (owner == viewer->process_.dwProcessId && std::string(name) == "KarvelViewerFrame" && IsWindowVisible(hwnd)) {
+            viewer->frame = hwnd;
+            return FALSE;
+        }
+        return TRUE;
+    }
+};
+
+struct Picture {
+    int width = 0, height = 0;
+    std::vector<unsigned char> rgb;
+
+    explicit Picture(const std::string& png)
+    {
+        int channels = 0;
+        unsigned char* pixels = stbi_load(png.c_str(), &width, &height, &channels, 3);
+        if (pixels)
+            rgb.assign(pixels, pixels + width * height * 3);
+        stbi_image_free(pixels);
+    }
+    const unsigned char* At(int x, int y) const { return &rgb[(y * width + x) * 3]; }
+};
+
 bool Exists(const std::string& path) { return GetFileAttributesA(path.c_str()) != INVALID_FILE_ATTRIBUTES; }
 
 // A red box in front of a grey plate on a blue background, seen straight from -y: the box
@@ -83,21 +165,18 @@ TEST_F(ViewerBatch, SnapshotHasTheRequestedSizeAndTheSceneAtKnownPixels)
     std::string png = dir.Path("box.png");
     ViewerRun run = RunViewer(Quoted(scene) + " --snapshot " + Quoted(png) + " --size 320x240");
     ASSERT_EQ(run.exitCode, 0u) << run.output;
-    int width = 0, height = 0, channels = 0;
-    unsigned char* pixels = stbi_load(png.c_str(), &width, &height, &channels, 3);
-    ASSERT_NE(pixels, nullptr) << run.output;
-    EXPECT_EQ(width, 320);
-    EXPECT_EQ(height, 240);
-    auto at = [&](int x, int y) { return pixels + (y * width + x) * 3; };
-    const unsigned char* middle = at(160, 120);  // the box's lit front
+    Picture picture(png);
+    ASSERT_FALSE(picture.rgb.empty()) << run.output;
+    EXPECT_EQ(picture.width, 320);
+    EXPECT_EQ(picture.height, 240);
+    const unsigned char* middle = picture.At(160, 120);  // the box's lit front
     EXPECT_GT(middle[0], 120) << int(middle[0]) << "," << int(middle[1]) << "," << int(middle[2]);
     EXPECT_LT(middle[1], 40);
     EXPECT_LT(middle[2], 40);
-    const unsigned char* corner = at(5, 5);  // background
+    const unsigned char* corner = picture.At(5, 5);  // background
     EXPECT_EQ(corner[0], 0);
     EXPECT_EQ(corner[1], 0);
     EXPECT_EQ(corner[2], 255);
-    stbi_image_free(pixels);
 }
 
 TEST_F(ViewerBatch, PickNamesTheEntitiesNearestFirstAndThePointOnTheNearest)
@@ -173,4 +252,41 @@ TEST_F(ViewerBatch, CommandLineMistakesShowTheUsage)
     EXPECT_EQ(run.exitCode, 2u);
     EXPECT_NE(run.output.find("--size expects WxH"), std::string::npos) << run.output;
     EXPECT_NE(run.output.find("usage: karvel_viewer"), std::string::npos) << run.output;
+}
+
+// A user's session: a snapshot, a click that picks, a drag that orbits, a fit, and closing.
+TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
+{
+    OpenViewer viewer(Quoted(scene) + " --size 320x240", dir.Path(""));
+    ASSERT_NE(viewer.view, nullptr);
+    ASSERT_NE(viewer.status, nullptr);
+
+    viewer.Key('S');
+    Picture before(dir.Path("karvel-snapshot-1.png"));
+    ASSERT_EQ(before.width, 320);
+    EXPECT_GT(before.At(160, 120)[0], 120);
+    EXPECT_NE(viewer.StatusText().find("karvel-snapshot-1.png"), std::string::npos) << viewer.StatusText();
+
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 160, 120);
+    viewer.Mouse(WM_LBUTTONUP, 0, 161, 120);
+    EXPECT_EQ(viewer.StatusText().rfind("red box at (", 0), 0u) << viewer.StatusText();
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 5, 5);  // on the background: the highlight goes
+    viewer.Mouse(WM_LBUTTONUP, 0, 5, 5);
+    EXPECT_EQ(viewer.StatusText(), "Nothing here");
+
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 100, 120);
+    for (int x = 110; x <= 200; x += 10)
+        viewer.Mouse(WM_MOUSEMOVE, MK_LBUTTON, x, 120);
+    viewer.Mouse(WM_LBUTTONUP, 0, 200, 120);
+    viewer.Key('S');
+    Picture after(dir.Path("karvel-snapshot-2.png"));
+    ASSERT_EQ(after.rgb.size(), before.rgb.size());
+    size_t changed = 0;
+    for (size_t i = 0; i < after.rgb.size(); ++i)
+        changed += after.rgb[i] != before.rgb[i];
+    EXPECT_GT(changed, 1000u);  // the box was seen from another side
+
+    viewer.Key('F');
+    viewer.Key(VK_ESCAPE);
+    EXPECT_EQ(viewer.Close(), 0u);
 }
