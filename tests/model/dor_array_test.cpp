@@ -55,7 +55,7 @@ TEST(DorArrayGrowth, ShrinkKeepsStorageAndGrowingBackZeroFills)
 #endif
 }
 
-TEST(DorArrayElements, ConstructedAndDestroyedExactlyOnceAcrossRelocation)
+TEST(DorArrayElements, ConstructedAndDestroyedOnceAcrossRelocationAndAddSurvivesItsOwnElement)
 {
     Tracked::alive = 0;
     {
@@ -70,10 +70,6 @@ TEST(DorArrayElements, ConstructedAndDestroyedExactlyOnceAcrossRelocation)
         EXPECT_EQ(Tracked::alive, 10);
     }
     EXPECT_EQ(Tracked::alive, 0);
-}
-
-TEST(DorArrayElements, AddReturnsIndexAndSurvivesAddingItsOwnElement)
-{
     CDorArray<double, const double&> d;
     EXPECT_EQ(d.Add(2.5), 0);
     for (int i = 1; i <= 200; ++i)

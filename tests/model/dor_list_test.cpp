@@ -45,15 +45,12 @@ TEST(DorList, LastRemovalFreesEveryBlock)
     list.RemoveAt(ha);
     EXPECT_NE(list.blocks, nullptr);
     list.RemoveAt(hb);
-    EXPECT_EQ(list.blocks, nullptr);
-    EXPECT_EQ(list.freeList, nullptr);
-    EXPECT_EQ(list.head, nullptr);
-    EXPECT_EQ(list.tail, nullptr);
+    EXPECT_TRUE(list.blocks == nullptr && list.freeList == nullptr && list.head == nullptr && list.tail == nullptr);
     list.AddTail(&a);
     EXPECT_EQ(Contents(list), std::vector<int>{1});
 }
 
-TEST(DorList, MovingToHeadOrTailWritesTheHandleBack)
+TEST(DorList, MovingToHeadOrTailWritesTheHandleBackAndCopiesKeepOrder)
 {
     int v[4] = {0, 1, 2, 3};
     CDorList list;
@@ -65,22 +62,14 @@ TEST(DorList, MovingToHeadOrTailWritesTheHandleBack)
     list.MoveToTail(h[0]);
     EXPECT_EQ(Contents(list), (std::vector<int>{2, 1, 3, 0}));
     EXPECT_EQ(CDorList::GetAt(h[0]), &v[0]);
+    CDorList copy(list);
+    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1, 3, 0}));
+    copy = CDorList();
+    EXPECT_EQ(copy.GetCount(), 0);
 
     CDorList single;
     _DorPosition* only = single.AddTail(&v[1]);
     single.MoveToHead(only);  // frees every block on the way: the handle must be the new one
     EXPECT_EQ(single.GetHeadPosition(), only);
     EXPECT_EQ(CDorList::GetAt(only), &v[1]);
-}
-
-TEST(DorList, CopiesKeepOrder)
-{
-    int a = 1, b = 2;
-    CDorList list;
-    list.AddTail(&a);
-    list.AddHead(&b);
-    CDorList copy(list);
-    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1}));
-    copy = CDorList();
-    EXPECT_EQ(copy.GetCount(), 0);
 }

@@ -33,9 +33,7 @@ TEST(NewellNormal, PointsTowardTheViewerOfACounterClockwiseLoop)
 {
     DorVector3 square[4] = {DorVector3(0, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 2, 0), DorVector3(0, 2, 0)};
     DorVector3 n = DorNewellNormal(square, 4);
-    EXPECT_EQ(n.x, 0.0);
-    EXPECT_EQ(n.y, 0.0);
-    EXPECT_EQ(n.z, 8.0);  // twice the area
+    EXPECT_TRUE(n.x == 0.0 && n.y == 0.0 && n.z == 8.0);  // twice the area
     EXPECT_TRUE(DorNormalize(n));
     EXPECT_EQ(n.z, 1.0);
     DorVector3 tiny(0, 0, 0.00005);
@@ -81,9 +79,7 @@ TEST(PlaneProjection, AnchorToExactOriginAndNormalToPlusZWhateverTheRotation)
         DorVector3 anchor(unit(rng) * 100, unit(rng) * 100, unit(rng) * 100);
         DorMatrix4x4 m = DorPlaneProjection(n, anchor);
         DorVector3 a = DorTransformPoint(anchor, m);
-        ASSERT_EQ(a.x, 0.0);
-        ASSERT_EQ(a.y, 0.0);
-        ASSERT_EQ(a.z, 0.0);
+        ASSERT_TRUE(a.x == 0.0 && a.y == 0.0 && a.z == 0.0) << a.x << "," << a.y << "," << a.z;
         DorVector3 z = DorTransformDirection(n, m);
         ASSERT_NEAR(z.z, 1.0, 1e-12);
         ASSERT_NEAR(z.x, 0.0, 1e-12);

@@ -7,20 +7,6 @@ bool IsColour(const DorColorValue& c, float r, float g, float b, float a)
 {
     return c.r == r && c.g == g && c.b == b && c.a == a;
 }
-
-CVelTrianglePolys IndexedGroup(int triangleCount)
-{
-    CVelTrianglePolys g;
-    g.GroupType = VelGroupIndexed;
-    g.vertices.SetSize(3);
-    g.triangles.SetSize(triangleCount);
-    g.RenderKind = VelRenderTextured;
-    g.texture = 4;
-    g.lineWidth = 3.0f;
-    g.OverlayFlag = 1;
-    g.material.shininess = 5.0f;
-    return g;
-}
 }  // namespace
 
 TEST(RecordDefaults, VectorsVertexRectangleAndGroup)
@@ -44,42 +30,36 @@ TEST(RecordDefaults, VectorsVertexRectangleAndGroup)
     EXPECT_EQ(m.shininess, 80.0f);
 }
 
-TEST(TrianglePolys, RemoveAllResetsTypeKindTextureButKeepsMaterialWidthOverlay)
+TEST(TrianglePolys, AssignmentIsDeepAndRemoveAllKeepsMaterialWidthAndOverlay)
 {
-    CVelTrianglePolys g = IndexedGroup(10);
-    g.RemoveAll();
-    EXPECT_EQ(g.GroupType, 4);
-    EXPECT_EQ(g.vertices.GetSize(), 0);
-    EXPECT_EQ(g.triangles.GetSize(), 0);
-    EXPECT_EQ(g.triangles.maxSize, 0);
-    EXPECT_EQ(g.RenderKind, 0);
-    EXPECT_EQ(g.texture, 0u);
-    EXPECT_EQ(g.material.shininess, 5.0f);
-    EXPECT_EQ(g.lineWidth, 3.0f);
-    EXPECT_EQ(g.OverlayFlag, 1);
-}
-
-TEST(TrianglePolys, AssignmentIsDeepAndKeepsDestinationCapacity)
-{
-    CVelTrianglePolys src = IndexedGroup(2);
+    CVelTrianglePolys src;
+    src.GroupType = VelGroupIndexed;
+    src.vertices.SetSize(3);
+    src.triangles.SetSize(2);
+    src.RenderKind = VelRenderTextured;
+    src.texture = 4;
+    src.lineWidth = 3.0f;
+    src.OverlayFlag = 1;
+    src.material.shininess = 5.0f;
     src.vertices[1].position = DorVector3(1, 2, 3);
     src.triangles[1] = _VelTriangleIndex(0, 2, 1);
     CVelTrianglePolys dst;
     dst.vertices.SetSize(40);
     dst = src;
-    EXPECT_EQ(dst.vertices.GetSize(), 3);
-    EXPECT_EQ(dst.vertices.maxSize, 40);
-    EXPECT_EQ(dst.vertices[1].position.y, 2.0);
-    EXPECT_EQ(dst.triangles[1].b, 2);
-    EXPECT_EQ(dst.texture, 4u);
-    EXPECT_EQ(dst.OverlayFlag, 1);
-    src.vertices[1].position.y = -1;
-    EXPECT_EQ(dst.vertices[1].position.y, 2.0);
+    src.vertices[1].position.y = -1;  // a deep copy does not follow
+    EXPECT_TRUE(dst.vertices.GetSize() == 3 && dst.vertices.maxSize == 40 && dst.vertices[1].position.y == 2.0);
+    EXPECT_TRUE(dst.triangles[1].b == 2 && dst.texture == 4u && dst.OverlayFlag == 1 && dst.GroupType == 6);
+
+    dst.RemoveAll();
+    EXPECT_TRUE(dst.GroupType == 4 && dst.RenderKind == 0 && dst.texture == 0u);
+    EXPECT_TRUE(dst.vertices.GetSize() == 0 && dst.triangles.GetSize() == 0 && dst.triangles.maxSize == 0);
+    EXPECT_TRUE(dst.material.shininess == 5.0f && dst.lineWidth == 3.0f && dst.OverlayFlag == 1);
 }
 
-TEST(Primitive, AssigningFewerGroupsDestroysSurplusAndKeepsStorage)
+TEST(Primitive, AssigningFewerGroupsKeepsStorageAndDeleteAllKeepsDrawMode)
 {
     CVelPrimitive five;
+    EXPECT_EQ(five.DrawMode, 2);  // pickable by default
     five.groups.SetSize(5);
     five.groups[4].vertices.SetSize(9);
     CVelPrimitive two;
@@ -87,22 +67,10 @@ TEST(Primitive, AssigningFewerGroupsDestroysSurplusAndKeepsStorage)
     two.groups[1].GroupType = VelGroupLines;
     two.DrawMode = 3;
     five = two;
-    EXPECT_EQ(five.groups.GetSize(), 2);
-    EXPECT_EQ(five.groups.maxSize, 5);
-    EXPECT_EQ(five.groups[1].GroupType, 1);
+    EXPECT_TRUE(five.groups.GetSize() == 2 && five.groups.maxSize == 5 && five.groups[1].GroupType == 1);
     EXPECT_EQ(five.DrawMode, 3);
-}
-
-TEST(Primitive, DeleteAllKeepsDrawModeAndDefaultIsPickable)
-{
-    CVelPrimitive p;
-    EXPECT_EQ(p.DrawMode, 2);
-    p.groups.SetSize(3);
-    p.DrawMode = 1;
-    p.DeleteAll();
-    EXPECT_EQ(p.groups.GetSize(), 0);
-    EXPECT_EQ(p.groups.maxSize, 0);
-    EXPECT_EQ(p.DrawMode, 1);
+    five.DeleteAll();
+    EXPECT_TRUE(five.groups.GetSize() == 0 && five.groups.maxSize == 0 && five.DrawMode == 3);
 }
 
 TEST(DrawnElementCount, FollowsTheGroupType)
