@@ -15,16 +15,21 @@ void NameTexture(CDorGeometry& geometry, unsigned int name)
 }
 }  // namespace
 
-void AddSceneModel(CVelKarvel& modeller, Scene& scene, SceneNames& names)
+std::vector<unsigned int> AddSceneTextures(CVelKarvel& modeller, Scene& scene)
 {
     std::vector<unsigned int> textureNames;
     for (auto& texture : scene.textures)
         textureNames.push_back(modeller.AddTexture(texture->bitmap));
+    return textureNames;
+}
 
+void AddSceneEntities(CVelKarvel& modeller, Scene& scene, const std::vector<unsigned int>& textureNames,
+                      SceneNames& names)
+{
     for (auto& entity : scene.entities) {
         _DorPosition* position;
         if (entity->geometry) {
-            if (entity->texture >= 0)
+            if (entity->texture >= 0 && static_cast<size_t>(entity->texture) < textureNames.size())
                 NameTexture(*entity->geometry, textureNames[static_cast<size_t>(entity->texture)]);
             CDorShape shape;
             shape.Add(entity->geometry.get());

@@ -66,12 +66,13 @@ ModelView::~ModelView()
 
 bool ModelView::Start(Scene& scene)
 {
-    AddSceneModel(modeller, scene, names);
+    std::vector<unsigned int> textureNames = AddSceneTextures(modeller, scene);
     modeller.Initialize(dc);
     // NOTE: Initialize reports success even when no context could be made; only the current
     // context tells.
     if (!modeller.GetCurrent())
         return false;
+    AddSceneEntities(modeller, scene, textureNames, names);
     ApplySceneView(modeller, scene);
     return true;
 }

@@ -1,6 +1,6 @@
 #pragma once
 // The modeller in a window, held the way a host holds it: the window's own DC, the scene's
-// model added before the context starts, and the entities' names for picks. Shared by the
+// model, and the entities' names for picks. Shared by the
 // interactive window and the batch runs.
 #include <windows.h>
 
@@ -25,8 +25,8 @@ public:
     ModelView(const ModelView&) = delete;
     ModelView& operator=(const ModelView&) = delete;
 
-    // Adds the scene's model, starts the modeller on the window's DC and sets the scene's view.
-    // False when no OpenGL context could be made.
+    // Starts the modeller on the window's DC with the scene's textures, adds its entities and
+    // sets its view. False when no OpenGL context could be made.
     bool Start(Scene& scene);
     void Draw();
     // The entities under the pixel, nearest first; point is the 3-D point on the nearest and

@@ -65,7 +65,7 @@ protected:
 
 TEST_F(TexturedBoxScene, EveryEntityIsAddedUnderItsName)
 {
-    AddSceneModel(modeller, scene, names);
+    AddSceneEntities(modeller, scene, AddSceneTextures(modeller, scene), names);
     ASSERT_EQ(names.size(), 3u);
     ASSERT_EQ(modeller.entities.size(), 3u);
     EXPECT_EQ(EntityNamed("box").groups.GetSize(), 6);  // four walls and two caps
@@ -75,7 +75,7 @@ TEST_F(TexturedBoxScene, EveryEntityIsAddedUnderItsName)
 
 TEST_F(TexturedBoxScene, WallsAndCapsCarryTheNameTheModellerGave)
 {
-    AddSceneModel(modeller, scene, names);
+    AddSceneEntities(modeller, scene, AddSceneTextures(modeller, scene), names);
     ASSERT_EQ(modeller.textureWidths, std::vector<int>{8});
     const CVelPrimitive& box = EntityNamed("box");
     for (int g = 0; g < box.groups.GetSize(); ++g) {
@@ -88,7 +88,7 @@ TEST_F(TexturedBoxScene, WallsAndCapsCarryTheNameTheModellerGave)
 TEST_F(TexturedBoxScene, ARefusedTextureLeavesTheBoxPlain)
 {
     modeller.refuseTextures = true;
-    AddSceneModel(modeller, scene, names);
+    AddSceneEntities(modeller, scene, AddSceneTextures(modeller, scene), names);
     const CVelPrimitive& box = EntityNamed("box");
     ASSERT_EQ(box.groups.GetSize(), 6);
     for (int g = 0; g < box.groups.GetSize(); ++g)
