@@ -193,16 +193,20 @@ void ReadOptionalColour(const Json& object, const char* key, const std::string& 
 
 DorColorValue Scaled(const DorColorValue& c, float s) { return DorColorValue(c.r * s, c.g * s, c.b * s, c.a); }
 
-// "color" gives a plain material (diffuse c, ambient 0.4 c, a weak highlight); the other keys
-// override single parts of it, or of base when no colour is given.
-_DorMaterial ReadMaterial(const Json& value, const std::string& place, _DorMaterial base)
+enum class Surface { Faces, Lines };
+
+// "color" gives a plain material (diffuse c, ambient 0.4 c, a weak highlight); lines, which
+// have no normals and show only their ambient colour, get the line generator's diffuse 0.8 c
+// and ambient c. The other keys override single parts of it, or of base when no colour is given.
+_DorMaterial ReadMaterial(const Json& value, const std::string& place, _DorMaterial base, Surface surface)
 {
     ExpectObject(value, place, "a material object");
     CheckKeys(value, place, {"color", "diffuse", "ambient", "specular", "shininess"});
     if (const Json* colour = Find(value, "color")) {
         DorColorValue c = ReadColour(*colour, Member(place, "color"));
-        base.diffuse = c;
-        base.ambient = Scaled(c, 0.4f);
+        bool lines = surface == Surface::Lines;
+        base.diffuse = lines ? Scaled(c, 0.8f) : c;
+        base.ambient = lines ? c : Scaled(c, 0.4f);
         base.specular = DorColorValue(0.3f, 0.3f, 0.3f, 1.0f);
         base.emission = DorColorValue(0.0f, 0.0f, 0.0f, 0.0f);
         base.shininess = 30.0f;
@@ -504,7 +508,7 @@ private:
         if (const Json* style = Find(value, "style"))
             geometry.style = ReadChoice(*style, Member(place, "style"), {"solid", "wire"}) == 0 ? DorStyleSolid : DorStyleWire;
         if (const Json* material = Find(value, "material"))
-            geometry.material = ReadMaterial(*material, Member(place, "material"), geometry.material);
+            geometry.material = ReadMaterial(*material, Member(place, "material"), geometry.material, Surface::Faces);
         const Json* texture = Find(value, "texture");
         if (!texture)
             return;
@@ -553,7 +557,7 @@ private:
     void ReadLineLook(const Json& value, const std::string& place, CVelTrianglePolys& group)
     {
         if (const Json* material = Find(value, "material"))
-            group.material = ReadMaterial(*material, Member(place, "material"), group.material);
+            group.material = ReadMaterial(*material, Member(place, "material"), group.material, Surface::Lines);
         if (const Json* width = Find(value, "width"))
             group.lineWidth = static_cast<float>(
                 ReadBounded(*width, Member(place, "width"), 1.0, 10.0, "a line width in pixels from 1 to 10"));

@@ -215,7 +215,8 @@ TEST_F(SceneFileTest, LinesAndGridsBecomePrimitivesWithTheirLook)
     EXPECT_EQ(line.GroupType, VelGroupLines);
     ASSERT_EQ(line.vertices.GetSize(), 2);
     EXPECT_DOUBLE_EQ(line.vertices[1].position.x, 5.0);
-    EXPECT_FLOAT_EQ(line.material.diffuse.r, 1.0f);
+    EXPECT_FLOAT_EQ(line.material.ambient.r, 1.0f);  // lines show their ambient colour
+    EXPECT_FLOAT_EQ(line.material.diffuse.r, 0.8f);
     EXPECT_FLOAT_EQ(line.material.diffuse.g, 0.0f);
     EXPECT_FLOAT_EQ(line.lineWidth, 3.0f);
 
