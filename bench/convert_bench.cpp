@@ -5,7 +5,7 @@
 
 #include "convert/convert_test_support.h"
 #include "convert/vel_polygon_triangulation.h"
-#include "convert/vel_shape_to_primitive.h"
+#include "convert_bench_support.h"
 
 using namespace convert_test;
 
@@ -36,14 +36,7 @@ void ConvertScene(benchmark::State& state)
         solids.push_back(std::make_unique<CDorExtruded>(base, DorVector3(0, 0, 1 + i % 5)));
         shape.Add(solids.back().get());
     }
-    int groups = 0;
-    for (auto _ : state) {
-        CVelPrimitive primitive;
-        CVelShapeToPrimitive().ConvertShape(shape, primitive);
-        groups = primitive.groups.GetSize();
-        benchmark::DoNotOptimize(primitive.groups.data);
-    }
-    state.counters["groups"] = groups;
+    ConvertShapeRepeatedly(state, shape);
 }
 }  // namespace
 

@@ -93,6 +93,8 @@ int CDorHolePolygon::AddHole(const CDorPolygon& hole)
     return holes.Add(copy);
 }
 
+int CDorHolePolygon::AddHole(const DorVector3* loop, int count) { return AddHole(CDorPolygon(loop, count)); }
+
 CDorHolePolygon CDorHolePolygon::Translated(const DorVector3& offset) const
 {
     CDorHolePolygon moved(*this);

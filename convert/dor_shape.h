@@ -83,6 +83,8 @@ public:
 
     void SetPoints(const DorVector3* outline, int count);
     int AddHole(const CDorPolygon& hole);
+    // A hole from a host's own point array; returns its index.
+    int AddHole(const DorVector3* loop, int count);
     // A copy moved by offset, holes and texture points included.
     CDorHolePolygon Translated(const DorVector3& offset) const;
 };

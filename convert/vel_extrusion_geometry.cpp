@@ -20,6 +20,38 @@ DorVector3 UnitCross(const DorVector3& a, const DorVector3& b)
     DorNormalize(c);
     return c;
 }
+
+void FillWireSides(const CDorGeometry& head, const DorVector3 quad[4], bool faceIn, CVelTrianglePolys& sides)
+{
+    DorVector3 normals[4];
+    VelWallCornerNormals(quad[0], quad[1], quad[2], quad[3], normals);
+    sides.GroupType = VelGroupLines;
+    sides.vertices.SetSize(4);
+    for (int k = 0; k < 4; ++k) {
+        sides.vertices[k].position = quad[k];
+        sides.vertices[k].normal = faceIn ? normals[k] * -1.0 : normals[k];
+    }
+    sides.material = head.material;
+}
+
+void FillWireLoop(const CDorGeometry& head, const std::vector<DorVector3>& loop, const DorVector3& normal,
+                  CVelTrianglePolys& outline)
+{
+    outline.GroupType = VelGroupLineStrip;
+    outline.material = head.material;
+    outline.vertices.SetSize(static_cast<int>(loop.size()));
+    for (int k = 0; k < outline.vertices.GetSize(); ++k) {
+        outline.vertices[k].position = loop[k];
+        outline.vertices[k].normal = normal;
+    }
+}
+
+DorVector3 UnitNormal(const std::vector<DorVector3>& loop)
+{
+    DorVector3 normal = DorNewellNormal(loop.data(), static_cast<int>(loop.size()));
+    DorNormalize(normal);
+    return normal;
+}
 }  // namespace
 
 DorVector3 VelExtrusionDirection(const DorPointArray& bottom, const DorPointArray& top)
@@ -85,4 +117,39 @@ DorMatrix4x4 VelWallTextureFrame(const DorVector3& wallNormal, const DorVector3&
     DorVector3 along = axis;
     DorNormalize(along);
     return frame * DorRotateZ(-DorAzimuth(DorTransformDirection(along, frame)));
+}
+
+void VelFillSolidWall(const CDorGeometry& head, const DorVector3& textureAxis, const DorVector3 quad[4],
+                      const DorVector3& anchor, bool withTexCoords, CVelTrianglePolys& wall)
+{
+    DorVector3 normal = VelQuadNormal(quad[0], quad[1], quad[3], quad[2]);
+    wall.vertices.SetSize(4);
+    for (int k = 0; k < 4; ++k) {
+        wall.vertices[k].position = quad[k];
+        wall.vertices[k].normal = normal;
+    }
+    if (withTexCoords) {
+        DorMatrix4x4 frame = VelWallTextureFrame(normal, anchor, textureAxis);
+        for (int k = 0; k < 4; ++k) {
+            DorVector3 q = DorTransformPoint(quad[k], frame);
+            wall.vertices[k].texcoord = DorVector2(q.x / head.textureScaleU, q.y / head.textureScaleV);
+        }
+    }
+    wall.material = head.material;
+    if (head.texture != 0)
+        wall.RenderKind = VelRenderTextured;
+    wall.texture = head.texture;
+}
+
+void VelFillWireFrame(const CDorGeometry& head, const DorPointArray& bottomPoints, const DorPointArray& topPoints,
+                      bool sidesFaceIn, CVelTrianglePolys* groups)
+{
+    const int m = bottomPoints.GetSize();
+    std::vector<DorVector3> bottom = VelClosedLoop(bottomPoints), top = VelClosedLoop(topPoints);
+    for (int k = 0; k < m; ++k) {
+        const DorVector3 quad[4] = {top[k], bottom[k], top[k + 1], bottom[k + 1]};
+        FillWireSides(head, quad, sidesFaceIn, groups[k]);
+    }
+    FillWireLoop(head, bottom, UnitNormal(bottom) * -1.0, groups[m]);  // away from the solid
+    FillWireLoop(head, top, UnitNormal(top), groups[m + 1]);
 }

@@ -4,7 +4,8 @@
 // solid when the profiles run counter-clockwise about the bottom-to-top direction.
 #include <vector>
 
-#include "model/dor_types.h"
+#include "convert/dor_shape.h"
+#include "model/vel_primitive.h"
 
 typedef CDorArray<DorVector3, DorVector3&> DorPointArray;
 
@@ -30,3 +31,16 @@ void VelWallCornerNormals(const DorVector3& ti, const DorVector3& bi, const DorV
 // Maps a wall into texture space: the plane projection of the wall anchored at anchor, then
 // turned so that axis runs along U. A zero axis keeps the wall's own frame.
 DorMatrix4x4 VelWallTextureFrame(const DorVector3& wallNormal, const DorVector3& anchor, const DorVector3& axis);
+
+// A flat-shaded wall: the quad's records in strip order, every normal the unit Newell normal of
+// the loop quad[0], quad[1], quad[3], quad[2], the head's material and texture. Texture
+// coordinates (when withTexCoords) come from the wall's texture frame anchored at anchor.
+void VelFillSolidWall(const CDorGeometry& head, const DorVector3& textureAxis, const DorVector3 quad[4],
+                      const DorVector3& anchor, bool withTexCoords, CVelTrianglePolys& wall);
+
+// The lines of the solid between two loops of the same count m >= 1, into groups[0..m+1]:
+// group k holds the side edges at k and at k+1 (top k, bottom k, top k+1, bottom k+1, each with
+// its corner normal, negated when sidesFaceIn), then the bottom loop (normals away from top for a
+// loop counter-clockwise about bottom-to-top) and the top loop, each closed on its first point.
+void VelFillWireFrame(const CDorGeometry& head, const DorPointArray& bottom, const DorPointArray& top,
+                      bool sidesFaceIn, CVelTrianglePolys* groups);

@@ -42,6 +42,21 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int*
 
 bool VelWindingInside(double angleSum) { return std::fabs(angleSum) > kPi; }
 
+bool VelOnLoopEdge(const DorVector2& q, const DorVector2* loop, int count)
+{
+    for (int k = 0; k < count; ++k) {
+        DorVector2 u = VelSub2(loop[k], q), v = VelSub2(loop[k + 1 < count ? k + 1 : 0], q);
+        if (!(std::fabs(VelCross2(u, v)) < 0.0001))
+            continue;
+        VelNormalize2(u);
+        VelNormalize2(v);
+        double dot = VelDot2(u, v);
+        if (dot > -1.0001 && dot < -0.0009)
+            return true;
+    }
+    return false;
+}
+
 bool VelPointOnSegment(const DorVector2& p, const DorVector2& a, const DorVector2& b)
 {
     DorVector2 d = VelSub2(b, a);

@@ -41,6 +41,11 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int*
 // Whether a winding sum puts its point inside: |sum| > pi.
 bool VelWindingInside(double angleSum);
 
+// Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
+// vectors from q to the edge's ends is below 0.0001 in magnitude and, once both are normalised,
+// their dot product lies between -1.0001 and -0.0009.
+bool VelOnLoopEdge(const DorVector2& q, const DorVector2* loop, int count);
+
 // Whether p lies on segment a-b strictly between its ends: its parameter t along a-b satisfies
 // 0 < t < 1 and is at least 1e-6 from both ends, and its distance from the segment is below
 // 1e-6. A zero-length segment holds no point.

@@ -40,3 +40,14 @@ TEST(PointOnSegment, InteriorWithinToleranceOnly)
     EXPECT_FALSE(VelPointOnSegment(DorVector2(11, 0), a, b));   // beyond
     EXPECT_FALSE(VelPointOnSegment(DorVector2(0, 0), a, a));    // zero length holds nothing
 }
+
+TEST(OnLoopEdge, LooseNearAnEdgeButNotAtACornerOrBeyond)
+{
+    EXPECT_TRUE(VelOnLoopEdge(DorVector2(1, 0), kSquare, 4));
+    EXPECT_TRUE(VelOnLoopEdge(DorVector2(1, -4e-5), kSquare, 4));  // cross 8e-5: still on it
+    EXPECT_FALSE(VelOnLoopEdge(DorVector2(1, -6e-5), kSquare, 4));  // cross 1.2e-4
+    EXPECT_FALSE(VelOnLoopEdge(DorVector2(0, 0), kSquare, 4));      // a corner: no direction to it
+    EXPECT_FALSE(VelOnLoopEdge(DorVector2(3, 0), kSquare, 4));      // on the line, beyond the end
+    EXPECT_FALSE(VelOnLoopEdge(DorVector2(1, 1), kSquare, 4));
+    EXPECT_FALSE(VelOnLoopEdge(DorVector2(1, 1), kSquare, 0));
+}

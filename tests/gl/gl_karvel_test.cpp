@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "camera/vel_math_camera.h"
+#include "convert/dor_shape.h"
 #include "gl/vel_gl_karvel.h"
 #include "model/dor_math.h"
 #include "support/gl_live_modeller.h"
@@ -99,6 +100,85 @@ TEST_F(LiveModeller, TriangleFacingASlopedCameraAppearsWhereTheViewMatrixPutsIt)
     EXPECT_TRUE(IsBackground(pixel(centre - right * 2)));
     EXPECT_TRUE(IsBackground(pixel(centre + up * 2)));
     EXPECT_TRUE(IsBackground(pixel(centre - up * 2)));
+}
+
+TEST_F(LiveModeller, OffsetMovesCameraAndSceneTogether)
+{
+    // The camera is kept in model coordinates, so the offset never shifts the picture.
+    Add(Rectangle(2, 1, 5, 4, 0, Matte(1, 0, 0)));
+    DorVector3 offset(100, -40, 7);
+    karvel.SetOffset(offset);
+    EXPECT_EQ(karvel.model.offset.x, 100.0);
+    EXPECT_GT(Draw(3.5, 0, 2.5).r, 150);
+    EXPECT_TRUE(IsBackground(Draw(1.7, 0, 2.5)));
+    EXPECT_TRUE(IsBackground(Draw(-3.5, 0, -2.5)));
+}
+
+TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
+{
+    karvel.Finalize();
+    HDC dc = window.dc;
+    _VelViewport quarter = {0, 0, kWidth / 2, kHeight / 2};
+    ASSERT_EQ(karvel.Initialize(dc, quarter), 1);
+    GLint gl[4];
+    glGetIntegerv(GL_VIEWPORT, gl);
+    EXPECT_EQ(gl[2], kWidth / 2);
+    EXPECT_EQ(gl[3], kHeight / 2);
+    _VelViewport now;
+    karvel.GetViewport(now);
+    EXPECT_EQ(now.width, kWidth / 2);
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
+    LookAlongY(karvel);
+    Add(Rectangle(-1, -1, 1, 1, 0, Matte(0, 1, 0)));
+    karvel.DrawModel(dc);
+    EXPECT_GT(PixelAt(kWidth / 4, kHeight * 3 / 4).g, 150);  // centre of the lower-left quarter
+    EXPECT_TRUE(IsBackground(PixelAt(kWidth / 2, kHeight / 2)));
+}
+
+TEST_F(LiveModeller, EachLineGroupSetsItsOwnWidth)
+{
+    // Vertical segments through the centres of pixel columns 80 and 100 (6 pixels per unit).
+    CVelPrimitive p;
+    const double columns[] = {80.5, 100.5};
+    const float widths[] = {3, 1};
+    for (int i = 0; i < 2; ++i) {
+        CVelTrianglePolys g;
+        g.GroupType = VelGroupLines;
+        g.lineWidth = widths[i];
+        g.material = Matte(1, 1, 1);
+        double x = (columns[i] - kWidth / 2.0) / 6;
+        AddVertex(g, x, 0, -3);
+        AddVertex(g, x, 0, 3);
+        p.groups.Add(g);
+    }
+    Add(p);
+    karvel.DrawModel(window.dc);
+    const int row = kHeight / 2 + 5;
+    EXPECT_TRUE(IsBackground(PixelAt(78, row)));
+    for (int col = 79; col <= 81; ++col)
+        EXPECT_GT(PixelAt(col, row).r, 150) << col;
+    EXPECT_TRUE(IsBackground(PixelAt(82, row)));
+    EXPECT_TRUE(IsBackground(PixelAt(99, row)));
+    EXPECT_GT(PixelAt(100, row).r, 150);
+    EXPECT_TRUE(IsBackground(PixelAt(101, row)));
+}
+
+TEST_F(LiveModeller, ExtrudedBoxAddedAsAShapeIsDrawnSolid)
+{
+    const DorVector3 square[] = {DorVector3(-2, -2, -2), DorVector3(2, -2, -2), DorVector3(2, 2, -2),
+                                 DorVector3(-2, 2, -2)};
+    CDorExtruded box(CDorPolygon(square, 4), DorVector3(0, 0, 4));
+    box.SetMaterial(Matte(1, 0, 0));
+    box.MatchCapsToWalls();
+    CDorShape shape;
+    shape.Add(&box);
+    ASSERT_NE(karvel.AddShape(shape), nullptr);
+    EXPECT_GT(Draw(0, -2, 0).r, 150);  // the front wall faces the camera
+    EXPECT_GT(Draw(1.8, -2, 1.8).r, 150);
+    EXPECT_TRUE(IsBackground(Draw(2.5, -2, 0)));
+    EXPECT_TRUE(IsBackground(Draw(0, -2, 2.5)));
 }
 
 TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
@@ -218,12 +298,7 @@ TEST_F(LiveModeller, TexturedRectangleShowsItsTexture)
     ASSERT_EQ(karvel.AddTexture(texture), 1u);
     HDC dc = window.dc;
     ASSERT_EQ(karvel.Initialize(dc), 1);
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    camera.eye = DorVector3(0, -10, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 90;
-    karvel.SetCamera(camera);
+    LookAlongY(karvel);
     DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
     karvel.SetBkColor(grey);
 
@@ -305,6 +380,47 @@ TEST(ModellerLifecycle, UninitialisedModellerKeepsItsStoreAndRefusesSceneCalls)
     EXPECT_EQ(karvel.GetDrawMode(none), -1);
 }
 
+TEST(ModellerStore, TheTwoMoveShapesTreatNormalsDifferently)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    _DorPosition* own = karvel.AddPrimitive(p);
+    _DorPosition* base = karvel.AddPrimitive(p);
+    DorMatrix4x4 shift = DorTranslate(10, 0, 0);
+    karvel.MoveShape(own, shift);
+    static_cast<CVelKarvel&>(karvel).MoveShape(base, shift);
+    CVelPrimitive a, b;
+    karvel.GetPrimitive(own, a, 1);
+    karvel.GetPrimitive(base, b, 1);
+    EXPECT_EQ(a.groups[0].vertices[1].position.x, 11.0);
+    EXPECT_EQ(b.groups[0].vertices[1].position.x, 11.0);
+    // The modeller's own turns the normal only; the interface's translates it too.
+    EXPECT_FLOAT_EQ(a.groups[0].vertices[1].normal.y, -1);
+    EXPECT_NEAR(b.groups[0].vertices[1].normal.x, 10 / std::sqrt(101.0), 1e-6);
+}
+
+TEST(ModellerStore, CopyTakesTheModelAndStartsUninitialised)
+{
+    CVelGLKarvel karvel;
+    CVelPrimitive p = Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0));
+    karvel.AddPrimitive(p);
+    DorColorValue blue(0, 0, 1, 1);
+    karvel.SetBkColor(blue);
+    TestWindow window(kWidth, kHeight);
+    HDC dc = window.dc;
+    ASSERT_EQ(karvel.Initialize(dc), 1);
+    karvel.AddPrimitive(p);
+    CVelGLKarvel copy(karvel);
+    EXPECT_EQ(copy.renderState, nullptr);
+    EXPECT_EQ(copy.context.handle, nullptr);
+    EXPECT_EQ(copy.model.entities.GetCount(), 1);
+    DorColorValue colour;
+    copy.GetBkColor(colour);
+    EXPECT_EQ(colour.b, 1.0f);
+    copy = copy;
+    EXPECT_EQ(copy.model.entities.GetCount(), 1);
+}
+
 TEST(ModellerLifecycle, FirstInitializeStartsFromAnEmptyModelAndKeepsTextures)
 {
     CVelGLKarvel karvel;
@@ -333,10 +449,7 @@ TEST(ModellerLifecycle, MovesToASecondWindowWithModelTexturesAndCamera)
     _VelCamera camera;
     karvel.GetCamera(camera);
     EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 120.0);
-    camera.eye = DorVector3(0, -10, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 90;
-    karvel.SetCamera(camera);
+    LookAlongY(karvel);
     CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
     p.groups[0].RenderKind = VelRenderTextured;
     p.groups[0].texture = 1;

@@ -72,9 +72,21 @@ inline CVelPrimitive Rectangle(double x0, double z0, double x1, double z1, doubl
     return p;
 }
 
+// Puts the camera 10 units in front of the origin on -y, looking along +y with a 90 degree
+// field of view: x to the right, z up.
+inline void LookAlongY(CVelGLKarvel& karvel)
+{
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    camera.eye = DorVector3(0, -10, 0);
+    camera.target = DorVector3(0, 0, 0);
+    camera.fovy = 90;
+    camera.zNear = 1;
+    camera.zFar = 1000;
+    karvel.SetCamera(camera);
+}
 
-// A modeller live in a 160 x 120 window, its camera 10 units in front of the origin on -y,
-// looking along +y with a 90 degree field of view: x to the right, z up.
+// A modeller live in a 160 x 120 window, its camera along +y (LookAlongY).
 class LiveModeller : public ::testing::Test {
 protected:
     // One window for the suite: creating one under Wine takes about two seconds.
@@ -89,14 +101,7 @@ protected:
     {
         ASSERT_EQ(karvel.Initialize(window.dc), 1);
         ASSERT_NE(karvel.GetCurrent(), nullptr);
-        _VelCamera camera;
-        karvel.GetCamera(camera);
-        camera.eye = DorVector3(0, -10, 0);
-        camera.target = DorVector3(0, 0, 0);
-        camera.fovy = 90;
-        camera.zNear = 1;
-        camera.zFar = 1000;
-        karvel.SetCamera(camera);
+        LookAlongY(karvel);
     }
 
     void TearDown() override { karvel.Finalize(); }

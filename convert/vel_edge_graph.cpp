@@ -1,0 +1,165 @@
+#include "convert/vel_edge_graph.h"
+
+#include <cmath>
+
+#include "convert/vel_plane2d.h"
+#include "model/dor_math.h"
+
+namespace {
+const int kRightMade = 1;
+const int kLeftMade = 2;
+}  // namespace
+
+VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
+{
+    plane.reserve(pointCount > 0 ? pointCount : 0);
+    edges.reserve(maxEdges > 0 ? maxEdges : 0);
+}
+
+void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
+{
+    for (int k = 0; k < count; ++k) {
+        DorVector3 p = DorTransformPoint(points[k], projection);
+        plane.push_back(DorVector2(p.x, p.y));
+    }
+}
+
+void VelEdgeGraph::AddLoopEdges(int first, int count)
+{
+    for (int k = 0; k < count; ++k)
+        edges.push_back(Edge{first + k, first + (k + 1 < count ? k + 1 : 0), 0});
+    loopEdgeCount = static_cast<int>(edges.size());
+}
+
+// The appended edges are tried before the loops' own: they are the ones that usually cross.
+bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
+{
+    const int count = static_cast<int>(edges.size());
+    for (int k = loopEdgeCount; k < count + loopEdgeCount; ++k) {
+        const Edge& e = edges[k < count ? k : k - count];
+        if (e.start == i || e.start == j || e.end == i || e.end == j)
+            continue;
+        if (VelSegmentsCross(plane[i], plane[j], plane[e.start], plane[e.end]))
+            return true;
+    }
+    return false;
+}
+
+bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
+{
+    for (int k = 0; k < static_cast<int>(plane.size()); ++k) {
+        if (k != i && k != j && VelPointOnSegment(plane[k], plane[i], plane[j]))
+            return true;
+    }
+    return false;
+}
+
+// The other end of the edge at s whose direction is nearest to u on the wanted side of it,
+// or -1. Among equals the earliest edge wins.
+int VelEdgeGraph::BestNeighbour(int c, int s, const DorVector2& u, bool clockwise) const
+{
+    double best = -1024.0;
+    int found = -1;
+    for (int k = 0; k < static_cast<int>(edges.size()); ++k) {
+        const Edge& e = edges[k];
+        if (k == c || (e.start != s && e.end != s))
+            continue;
+        int x = e.start == s ? e.end : e.start;
+        DorVector2 v = VelSub2(plane[x], plane[s]);
+        VelNormalize2(v);
+        double cross = VelCross2(u, v);
+        if (clockwise ? !(cross < 0.0) : !(cross > 0.0))
+            continue;
+        double dot = VelDot2(u, v);
+        if (dot > best) {
+            best = dot;
+            found = x;
+        }
+    }
+    return found;
+}
+
+int VelEdgeGraph::FindEdge(int p, int q) const
+{
+    for (int k = 0; k < static_cast<int>(edges.size()); ++k) {
+        const Edge& e = edges[k];
+        if ((e.start == p && e.end == q) || (e.start == q && e.end == p))
+            return k;
+    }
+    return -1;
+}
+
+// Marks the side of the edge on which the counter-clockwise triangle (a, b, x) lies: its left
+// when the edge runs the way the triangle goes round, its right otherwise.
+void VelEdgeGraph::MarkSide(int edge, int a, int b, int x)
+{
+    const Edge& e = edges[edge];
+    bool alongTriangle = (e.start == a && e.end == b) || (e.start == b && e.end == x) || (e.start == x && e.end == a);
+    edges[edge].sides |= alongTriangle ? kLeftMade : kRightMade;
+}
+
+// Marks the two closing edges of the counter-clockwise triangle (a, b, x) that the edge a-b
+// opens; returns whether both exist.
+bool VelEdgeGraph::CloseTriangle(int a, int b, int x)
+{
+    int toA = FindEdge(x, a);
+    int toB = FindEdge(x, b);
+    if (toA >= 0)
+        MarkSide(toA, a, b, x);
+    if (toB >= 0)
+        MarkSide(toB, a, b, x);
+    if (toA < 0 || toB < 0)
+        return false;
+    candidates.push_back(a);
+    candidates.push_back(b);
+    candidates.push_back(x);
+    return true;
+}
+
+void VelEdgeGraph::CloseTrianglesOnAddedEdges(bool finishOnOpenRight)
+{
+    for (int c = loopEdgeCount; c < static_cast<int>(edges.size()); ++c) {
+        if (edges[c].sides == (kRightMade | kLeftMade))
+            continue;
+        int s = edges[c].start, e = edges[c].end;
+        DorVector2 u = VelSub2(plane[e], plane[s]);
+        VelNormalize2(u);
+        if (!(edges[c].sides & kRightMade)) {
+            int x = BestNeighbour(c, s, u, true);
+            if (x >= 0) {
+                if (CloseTriangle(e, s, x))
+                    edges[c].sides |= kRightMade;
+                else if (finishOnOpenRight)
+                    continue;
+            }
+        }
+        if (!(edges[c].sides & kLeftMade)) {
+            int x = BestNeighbour(c, s, u, false);
+            if (x >= 0 && CloseTriangle(s, e, x))
+                edges[c].sides |= kLeftMade;
+        }
+    }
+}
+
+bool VelEdgeGraph::IsSliver(int a, int b, int c) const
+{
+    double twiceArea = VelCross2(VelSub2(plane[b], plane[a]), VelSub2(plane[c], plane[a]));
+    return std::sqrt(std::fabs(twiceArea)) <= 1e-5;
+}
+
+void VelEdgeGraph::EmitDistinct(CDorArray<int, int>& indices, bool dropSlivers) const
+{
+    for (size_t t = 0; t + 2 < candidates.size(); t += 3) {
+        int a = candidates[t], b = candidates[t + 1], c = candidates[t + 2];
+        bool repeat = false;
+        for (int o = 0; o + 2 < indices.GetSize() && !repeat; o += 3) {
+            int p = indices[o], q = indices[o + 1], r = indices[o + 2];
+            repeat = (p == a && q == b && r == c) || (p == b && q == c && r == a) || (p == c && q == a && r == b);
+        }
+        if (repeat || (dropSlivers && IsSliver(a, b, c)))
+            continue;
+        indices.Add(a);
+        indices.Add(b);
+        indices.Add(c);
+    }
+}

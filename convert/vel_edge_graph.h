@@ -1,0 +1,56 @@
+#pragma once
+// The edge list shared by both triangulations (internal, not exported). Points are projected
+// into their plane first; the list starts with the loops' own edges, admissible segments are
+// appended after them, and a triangle is closed on each side of every appended edge.
+//
+// Side marks: bit 1, the triangle to the right of start->end has been made; bit 2, the one to
+// its left. Every closed triangle is counter-clockwise in the plane.
+#include <vector>
+
+#include "model/dor_types.h"
+
+class VelEdgeGraph {
+public:
+    // Room for at most maxEdges edges, loops' own included.
+    VelEdgeGraph(int pointCount, int maxEdges);
+
+    // Projects points[0..count-1] by projection and appends their x, y.
+    void AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection);
+    // The closed loop of points first..first+count-1, each point joined to the next.
+    void AddLoopEdges(int first, int count);
+
+    bool HasRoom() const { return static_cast<int>(edges.size()) < maxEdges; }
+    void AddSegment(int i, int j) { edges.push_back(Edge{i, j, 0}); }
+
+    // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
+    bool CrossesListedEdge(int i, int j) const;
+    // Whether some point other than i and j lies on segment i-j.
+    bool PassesThroughPoint(int i, int j) const;
+
+    // Closes the triangles on each side of every appended edge, first to last. With
+    // finishOnOpenRight, an edge whose right triangle has a neighbour but lacks a closing edge
+    // is left without its left triangle too.
+    void CloseTrianglesOnAddedEdges(bool finishOnOpenRight);
+    // Appends the closed triangles to indices, leaving out repeats (equal up to rotation; a
+    // reversed triangle is distinct) and, with dropSlivers, triangles whose root of twice the
+    // area is at most 1e-5.
+    void EmitDistinct(CDorArray<int, int>& indices, bool dropSlivers) const;
+
+    std::vector<DorVector2> plane;
+
+private:
+    struct Edge {
+        int start, end, sides;
+    };
+
+    int BestNeighbour(int c, int s, const DorVector2& u, bool clockwise) const;
+    bool CloseTriangle(int a, int b, int x);
+    void MarkSide(int edge, int a, int b, int x);
+    int FindEdge(int p, int q) const;
+    bool IsSliver(int a, int b, int c) const;
+
+    int maxEdges;
+    int loopEdgeCount = 0;
+    std::vector<Edge> edges;
+    std::vector<int> candidates;  // three per triangle
+};
