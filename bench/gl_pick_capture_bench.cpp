@@ -5,7 +5,7 @@
 #include <cstdio>
 
 #include "gl/vel_gl_karvel.h"
-#include "gl_bench_grid.h"
+#include "gl_bench_model.h"
 #include "support/win32_test_window.h"
 #include "win32_bench.h"
 
@@ -14,19 +14,9 @@ int main()
     TestWindow window(640, 480);
     HDC dc = window.dc;
     CVelGLKarvel karvel;
-    if (!karvel.Initialize(dc)) {
+    if (!LoadBenchModel(karvel, dc, 10)) {
         std::printf("no context\n");
         return 0;
-    }
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    camera.eye = DorVector3(0, -12, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 60;
-    karvel.SetCamera(camera);
-    for (int i = 0; i < 10; ++i) {
-        CVelPrimitive p = BenchGrid(i);
-        karvel.AddPrimitive(p);
     }
 
     CDorArray<_VelSelect, _VelSelect&> hits;

@@ -7,21 +7,10 @@
 
 #include "camera/vel_math_camera.h"
 #include "model/dor_math.h"
+#include "support/camera_bits.h"
 #include "support/recording_karvel.h"
 
 namespace {
-_VelCamera Camera(DorVector3 eye, DorVector3 target, double fovy, double aspect)
-{
-    _VelCamera c;
-    c.eye = eye;
-    c.target = target;
-    c.fovy = fovy;
-    c.zNear = 1;
-    c.zFar = 10000;
-    c.aspect = aspect;
-    return c;
-}
-
 DorVector3 Corner(const DorVector3& low, const DorVector3& high, int i)
 {
     return DorVector3((i & 1) ? high.x : low.x, (i & 2) ? high.y : low.y, (i & 4) ? high.z : low.z);

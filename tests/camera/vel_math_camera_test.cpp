@@ -11,19 +11,6 @@ namespace {
 const double kNaN = std::numeric_limits<double>::quiet_NaN();
 const double kInf = std::numeric_limits<double>::infinity();
 
-_VelCamera Camera(DorVector3 eye, DorVector3 target, double fovy = 45.0)
-{
-    _VelCamera c;
-    c.eye = eye;
-    c.target = target;
-    c.fovy = fovy;
-    c.zNear = 1.0;
-    c.zFar = 1000.0;
-    c.aspect = 4.0 / 3.0;
-    return c;
-}
-
-
 void ExpectNear(const DorVector3& actual, double x, double y, double z, double tolerance = 1e-9)
 {
     EXPECT_NEAR(actual.x, x, tolerance);

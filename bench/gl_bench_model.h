@@ -1,6 +1,7 @@
 #pragma once
 // The model of the drawing, picking and capture benchmarks: lit grids of 10,000 triangles each,
 // facing -y and stacked along z, filling the view of a camera 12 units out on -y.
+#include "gl/vel_gl_karvel.h"
 #include "model/vel_primitive.h"
 
 const int kGridColumns = 100;  // quads per row of one grid
@@ -31,4 +32,23 @@ inline CVelPrimitive BenchGrid(int strip)
     CVelPrimitive p;
     p.groups.Add(g);
     return p;
+}
+
+// Initialises karvel on dc, puts the camera 12 units out on -y with a 60 degree field of view
+// and adds grids 0 .. grids - 1. False when there is no context.
+inline bool LoadBenchModel(CVelGLKarvel& karvel, HDC& dc, int grids)
+{
+    if (!karvel.Initialize(dc))
+        return false;
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    camera.eye = DorVector3(0, -12, 0);
+    camera.target = DorVector3(0, 0, 0);
+    camera.fovy = 60;
+    karvel.SetCamera(camera);
+    for (int i = 0; i < grids; ++i) {
+        CVelPrimitive p = BenchGrid(i);
+        karvel.AddPrimitive(p);
+    }
+    return true;
 }
