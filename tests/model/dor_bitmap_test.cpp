@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+
 #include "model/dor_bitmap.h"
 
 namespace {
@@ -18,41 +20,21 @@ bool AllZero(const _DorBitmap& b)
 }
 }  // namespace
 
-TEST(DorBitmapAllocate, OddWidthTrueColourRowsArePaddedToWords)
-{
-    _DorBitmap b;
-    ASSERT_TRUE(DorBitmapAllocate(b, 101, 50, 24));
-    EXPECT_EQ(b.bits.GetSize(), 304 * 50);  // 303 bytes of pixels per row, padded
-    EXPECT_EQ(b.fileSize, 15254u);
-    EXPECT_EQ(b.palette.GetSize(), 0);
-    EXPECT_EQ(b.info.width, 101);
-    EXPECT_EQ(b.info.height, 50);
-    EXPECT_EQ(b.info.bitCount, 24);
-    EXPECT_EQ(b.info.compression, 0u);
-    EXPECT_EQ(b.type, 0x4D42);
-    EXPECT_TRUE(AllZero(b));
-}
-
-TEST(DorBitmapAllocate, PalettedDepthsGetAFullColourTable)
+TEST(DorBitmapAllocate, RowsArePaddedToWordsAndPalettedDepthsGetAFullColourTable)
 {
     struct Case {
-        int width, bitCount, rowBytes, entries;
-    } cases[] = {{33, 1, 8, 2}, {5, 4, 4, 16}, {3, 8, 4, 256}, {9, 8, 12, 256}, {3, 16, 8, 0}, {3, 32, 12, 0}};
+        int width, height, bitCount, rowBytes, entries;
+    } cases[] = {{101, 50, 24, 304, 0}, {33, 7, 1, 8, 2}, {5, 7, 4, 4, 16}, {3, 7, 8, 4, 256}, {9, 7, 8, 12, 256},
+                 {3, 7, 16, 8, 0}, {3, 7, 32, 12, 0}, {4, -5, 24, 12, 0}};  // top-down keeps its sign
     for (const Case& c : cases) {
         _DorBitmap b;
-        ASSERT_TRUE(DorBitmapAllocate(b, c.width, 7, c.bitCount)) << c.bitCount;
-        EXPECT_EQ(b.bits.GetSize(), c.rowBytes * 7) << c.width << "x" << c.bitCount;
+        ASSERT_TRUE(DorBitmapAllocate(b, c.width, c.height, c.bitCount)) << c.bitCount;
+        EXPECT_EQ(b.bits.GetSize(), c.rowBytes * std::abs(c.height)) << c.width << "x" << c.bitCount;
         EXPECT_EQ(b.palette.GetSize(), c.entries) << c.bitCount;
         EXPECT_EQ(b.fileSize, FileBytesHeld(b)) << c.bitCount;
+        EXPECT_TRUE(b.type == 0x4D42 && b.info.compression == 0u && b.info.bitCount == c.bitCount &&
+                    b.info.width == c.width && b.info.height == c.height && AllZero(b));
     }
-}
-
-TEST(DorBitmapAllocate, TopDownHeightKeepsItsSignAndSizesByMagnitude)
-{
-    _DorBitmap b;
-    ASSERT_TRUE(DorBitmapAllocate(b, 4, -5, 24));
-    EXPECT_EQ(b.info.height, -5);
-    EXPECT_EQ(b.bits.GetSize(), 12 * 5);
 }
 
 TEST(DorBitmapAllocate, ImpossibleRequestsLeaveAnEmptyBitmap)

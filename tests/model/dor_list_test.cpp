@@ -14,7 +14,7 @@ std::vector<int> Contents(const CDorList& list)
 }
 }  // namespace
 
-TEST(DorList, HandlesStayValidWhileOthersAreRemoved)
+TEST(DorList, HandlesStayValidWhileOthersAreRemovedAndFreedNodesAreReusedFirst)
 {
     int v[25];
     CDorList list;
@@ -23,32 +23,17 @@ TEST(DorList, HandlesStayValidWhileOthersAreRemoved)
         v[i] = i;
         handle[i] = list.AddTail(&v[i]);
     }
+    // A block hands its nodes out in order.
+    EXPECT_EQ(reinterpret_cast<char*>(handle[1]) - reinterpret_cast<char*>(handle[0]),
+              static_cast<long>(sizeof(CDorList::Node)));
     for (int i = 0; i < 25; i += 2)
         list.RemoveAt(handle[i]);
+    list.RemoveAt(nullptr);
     EXPECT_EQ(list.GetCount(), 12);
     for (int i = 1; i < 25; i += 2)
         EXPECT_EQ(CDorList::GetAt(handle[i]), &v[i]);
     EXPECT_EQ(Contents(list), (std::vector<int>{1, 3, 5, 7, 9, 11, 13, 15, 17, 19, 21, 23}));
-}
-
-TEST(DorList, RemovedNodeIsReusedFirst)
-{
-    int a = 1, b = 2, c = 3;
-    CDorList list;
-    list.AddTail(&a);
-    _DorPosition* hb = list.AddTail(&b);
-    list.RemoveAt(hb);
-    EXPECT_EQ(list.AddTail(&c), hb);
-}
-
-TEST(DorList, NodesOfABlockAreHandedOutInOrder)
-{
-    int a = 1, b = 2;
-    CDorList list;
-    _DorPosition* first = list.AddTail(&a);
-    _DorPosition* second = list.AddTail(&b);
-    EXPECT_EQ(reinterpret_cast<char*>(second) - reinterpret_cast<char*>(first),
-              static_cast<long>(sizeof(CDorList::Node)));
+    EXPECT_EQ(list.AddTail(&v[0]), handle[24]);
 }
 
 TEST(DorList, LastRemovalFreesEveryBlock)
@@ -60,16 +45,12 @@ TEST(DorList, LastRemovalFreesEveryBlock)
     list.RemoveAt(ha);
     EXPECT_NE(list.blocks, nullptr);
     list.RemoveAt(hb);
-    EXPECT_EQ(list.blocks, nullptr);
-    EXPECT_EQ(list.freeList, nullptr);
-    EXPECT_EQ(list.head, nullptr);
-    EXPECT_EQ(list.tail, nullptr);
+    EXPECT_TRUE(list.blocks == nullptr && list.freeList == nullptr && list.head == nullptr && list.tail == nullptr);
     list.AddTail(&a);
-    EXPECT_NE(list.blocks, nullptr);
     EXPECT_EQ(Contents(list), std::vector<int>{1});
 }
 
-TEST(DorList, MovingToHeadOrTailWritesTheHandleBack)
+TEST(DorList, MovingToHeadOrTailWritesTheHandleBackAndCopiesKeepOrder)
 {
     int v[4] = {0, 1, 2, 3};
     CDorList list;
@@ -81,25 +62,14 @@ TEST(DorList, MovingToHeadOrTailWritesTheHandleBack)
     list.MoveToTail(h[0]);
     EXPECT_EQ(Contents(list), (std::vector<int>{2, 1, 3, 0}));
     EXPECT_EQ(CDorList::GetAt(h[0]), &v[0]);
+    CDorList copy(list);
+    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1, 3, 0}));
+    copy = CDorList();
+    EXPECT_EQ(copy.GetCount(), 0);
 
     CDorList single;
     _DorPosition* only = single.AddTail(&v[1]);
     single.MoveToHead(only);  // frees every block on the way: the handle must be the new one
-    EXPECT_EQ(single.GetCount(), 1);
     EXPECT_EQ(single.GetHeadPosition(), only);
     EXPECT_EQ(CDorList::GetAt(only), &v[1]);
-}
-
-TEST(DorList, NullHandleDoesNothingAndCopiesKeepOrder)
-{
-    int a = 1, b = 2;
-    CDorList list;
-    list.AddTail(&a);
-    list.AddHead(&b);
-    list.RemoveAt(nullptr);
-    EXPECT_EQ(list.GetCount(), 2);
-    CDorList copy(list);
-    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1}));
-    copy = CDorList();
-    EXPECT_EQ(copy.GetCount(), 0);
 }

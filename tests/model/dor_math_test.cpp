@@ -9,38 +9,31 @@ namespace {
 const double kPi = 3.14159265358979323846;
 }
 
-TEST(Rotations, RightAnglesAreExact)
+TEST(Matrices, RightAnglesAreExactAndTheLeftFactorAppliesFirst)
 {
-    DorMatrix4x4 rz = DorRotateZ(kPi / 2);
-    EXPECT_EQ(rz.m[0][0], 0.0);
-    EXPECT_EQ(rz.m[1][1], 0.0);
-    EXPECT_EQ(rz.m[0][1], 1.0);
-    DorVector3 p = DorTransformPoint(DorVector3(1, 0, 0), rz);  // counter-clockwise about +z
-    EXPECT_EQ(p.x, 0.0);
-    EXPECT_EQ(p.y, 1.0);
-    DorVector3 q = DorTransformPoint(DorVector3(0, 1, 0), DorRotateX(kPi / 2));
-    EXPECT_EQ(q.z, 1.0);
-    DorVector3 r = DorTransformPoint(DorVector3(0, 0, 1), DorRotateY(kPi / 2));
-    EXPECT_EQ(r.x, 1.0);
-}
-
-TEST(Matrices, ProductAppliesLeftFactorFirst)
-{
-    DorMatrix4x4 m = DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2);
-    DorVector3 p = DorTransformPoint(DorVector3(0, 0, 0), m);  // moved to (1,0,0), then turned
-    EXPECT_EQ(p.x, 0.0);
-    EXPECT_EQ(p.y, 1.0);
-    DorVector3 d = DorTransformDirection(DorVector3(1, 0, 0), m);
-    EXPECT_EQ(d.y, 1.0);
+    const struct {
+        DorMatrix4x4 m;
+        DorVector3 point, image;
+        bool direction;
+    } rows[] = {
+        {DorRotateZ(kPi / 2), {1, 0, 0}, {0, 1, 0}, false},  // counter-clockwise about +z
+        {DorRotateX(kPi / 2), {0, 1, 0}, {0, 0, 1}, false},
+        {DorRotateY(kPi / 2), {0, 0, 1}, {1, 0, 0}, false},
+        {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {0, 0, 0}, {0, 1, 0}, false},  // moved, then turned
+        {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {1, 0, 0}, {0, 1, 0}, true},
+    };
+    for (const auto& r : rows) {
+        DorVector3 p = r.direction ? DorTransformDirection(r.point, r.m) : DorTransformPoint(r.point, r.m);
+        EXPECT_TRUE(p.x == r.image.x && p.y == r.image.y && p.z == r.image.z)
+            << p.x << "," << p.y << "," << p.z << " for " << r.point.x << "," << r.point.y << "," << r.point.z;
+    }
 }
 
 TEST(NewellNormal, PointsTowardTheViewerOfACounterClockwiseLoop)
 {
     DorVector3 square[4] = {DorVector3(0, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 2, 0), DorVector3(0, 2, 0)};
     DorVector3 n = DorNewellNormal(square, 4);
-    EXPECT_EQ(n.x, 0.0);
-    EXPECT_EQ(n.y, 0.0);
-    EXPECT_EQ(n.z, 8.0);  // twice the area
+    EXPECT_TRUE(n.x == 0.0 && n.y == 0.0 && n.z == 8.0);  // twice the area
     EXPECT_TRUE(DorNormalize(n));
     EXPECT_EQ(n.z, 1.0);
     DorVector3 tiny(0, 0, 0.00005);
@@ -48,19 +41,31 @@ TEST(NewellNormal, PointsTowardTheViewerOfACounterClockwiseLoop)
     EXPECT_EQ(tiny.z, 0.00005);
 }
 
-TEST(DirectionAngles, QuadrantsAndVertical)
+TEST(DirectionAngles, QuadrantsVerticalAndTooShort)
 {
-    double el = 9, az = 9;
-    EXPECT_EQ(DorDirectionAngles(DorVector3(-1, 0, 0), el, az), DorDirectionSloped);
-    EXPECT_DOUBLE_EQ(az, kPi);
-    EXPECT_EQ(DorDirectionAngles(DorVector3(0, -2, 0), el, az), DorDirectionSloped);
-    EXPECT_DOUBLE_EQ(az, -kPi / 2);
-    EXPECT_EQ(DorDirectionAngles(DorVector3(1, 1, std::sqrt(2.0)), el, az), DorDirectionSloped);
-    EXPECT_DOUBLE_EQ(el, kPi / 4);
-    EXPECT_DOUBLE_EQ(az, kPi / 4);
-    EXPECT_EQ(DorDirectionAngles(DorVector3(0, 0, -3), el, az), DorDirectionVertical);
-    EXPECT_DOUBLE_EQ(el, -kPi / 2);
-    EXPECT_EQ(DorDirectionAngles(DorVector3(0, 0, 0.00001), el, az), DorDirectionTooShort);
+    const struct {
+        DorVector3 d;
+        DorDirectionKind kind;
+        double elevation, azimuth;  // the azimuth of DorAzimuth, which falls back to 0
+    } rows[] = {
+        {{-1, 0, 0}, DorDirectionSloped, 0, kPi},
+        {{-2, 0, 5}, DorDirectionSloped, std::atan(2.5), kPi},
+        {{0, -2, 0}, DorDirectionSloped, 0, -kPi / 2},
+        {{1, 1, std::sqrt(2.0)}, DorDirectionSloped, kPi / 4, kPi / 4},
+        {{0, 0, -3}, DorDirectionVertical, -kPi / 2, 0},
+        {{0.00005, 0, 0.00001}, DorDirectionTooShort, 9, 0},
+    };
+    for (const auto& r : rows) {
+        double el = 9, az = 9;
+        EXPECT_EQ(DorDirectionAngles(r.d, el, az), r.kind) << r.d.x << "," << r.d.y << "," << r.d.z;
+        if (r.kind != DorDirectionTooShort) {
+            EXPECT_DOUBLE_EQ(el, r.elevation) << r.d.x << "," << r.d.y << "," << r.d.z;
+        }
+        if (r.kind == DorDirectionSloped) {
+            EXPECT_DOUBLE_EQ(az, r.azimuth);
+        }
+        EXPECT_DOUBLE_EQ(DorAzimuth(r.d), r.azimuth);
+    }
 }
 
 TEST(PlaneProjection, AnchorToExactOriginAndNormalToPlusZWhateverTheRotation)
@@ -74,9 +79,7 @@ TEST(PlaneProjection, AnchorToExactOriginAndNormalToPlusZWhateverTheRotation)
         DorVector3 anchor(unit(rng) * 100, unit(rng) * 100, unit(rng) * 100);
         DorMatrix4x4 m = DorPlaneProjection(n, anchor);
         DorVector3 a = DorTransformPoint(anchor, m);
-        ASSERT_EQ(a.x, 0.0);
-        ASSERT_EQ(a.y, 0.0);
-        ASSERT_EQ(a.z, 0.0);
+        ASSERT_TRUE(a.x == 0.0 && a.y == 0.0 && a.z == 0.0) << a.x << "," << a.y << "," << a.z;
         DorVector3 z = DorTransformDirection(n, m);
         ASSERT_NEAR(z.z, 1.0, 1e-12);
         ASSERT_NEAR(z.x, 0.0, 1e-12);
@@ -86,56 +89,38 @@ TEST(PlaneProjection, AnchorToExactOriginAndNormalToPlusZWhateverTheRotation)
     EXPECT_EQ(turned.z, 1.0);  // the vertical case uses the single Y rotation
 }
 
-TEST(Invert, UndoesARigidMoveAndRefusesSingularMatrices)
+TEST(Invert, UndoesARigidMoveAndScalesAndRefusesSingularMatrices)
 {
-    DorMatrix4x4 m = DorTranslate(3, -2, 7) * DorRotateX(0.4) * DorRotateZ(-1.1) * DorTranslate(0, 0, 5);
+    DorMatrix4x4 scale;  // determinant 24: the inverse divides by each scale
+    scale.m[0][0] = 2;
+    scale.m[1][1] = 3;
+    scale.m[2][2] = 4;
+    DorMatrix4x4 m = DorTranslate(3, -2, 7) * DorRotateX(0.4) * scale * DorRotateZ(-1.1) * DorTranslate(0, 0, 5);
     DorMatrix4x4 inverse;
     ASSERT_TRUE(DorInvert(m, 1e-7, inverse));
-    DorVector3 p(1.5, -0.25, 4);
-    DorVector3 back = DorTransformPoint(DorTransformPoint(p, m), inverse);
-    EXPECT_NEAR(back.x, p.x, 1e-12);
-    EXPECT_NEAR(back.y, p.y, 1e-12);
-    EXPECT_NEAR(back.z, p.z, 1e-12);
+    const DorVector3 p(1.5, -0.25, 4), back = DorTransformPoint(DorTransformPoint(p, m), inverse);
+    EXPECT_NEAR(DorLength(back - p), 0.0, 1e-12);
 
-    DorMatrix4x4 scaled;  // determinant 2 * 3 * 4 = 24: the inverse divides by each scale
-    scaled.m[0][0] = 2;
-    scaled.m[1][1] = 3;
-    scaled.m[2][2] = 4;
-    ASSERT_TRUE(DorInvert(scaled, 1e-7, inverse));
-    EXPECT_DOUBLE_EQ(inverse.m[1][1], 1.0 / 3.0);
-
-    DorMatrix4x4 flat;
-    flat.m[2][2] = 0;  // squashes z: no inverse
     DorMatrix4x4 untouched = DorTranslate(9, 9, 9);
-    EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
+    for (double squash : {0.0, 1e-8, std::nan("")}) {  // no inverse, below the threshold, not a number
+        DorMatrix4x4 flat;
+        flat.m[2][2] = squash;
+        EXPECT_FALSE(DorInvert(flat, 1e-7, untouched)) << squash;
+    }
     EXPECT_EQ(untouched.m[3][0], 9.0);
-    flat.m[2][2] = 1e-8;  // below the threshold
-    EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
-    flat.m[2][2] = std::nan("");
-    EXPECT_FALSE(DorInvert(flat, 1e-7, untouched));
 }
 
 TEST(TruncateToInt, TowardZeroWithinIntRangeOnly)
 {
-    int out = 7;
-    EXPECT_TRUE(DorTruncateToInt(-2.9, out));
-    EXPECT_EQ(out, -2);
-    EXPECT_TRUE(DorTruncateToInt(2147483647.9, out));
-    EXPECT_EQ(out, 2147483647);
-    EXPECT_TRUE(DorTruncateToInt(-2147483648.9, out));
-    EXPECT_EQ(out, -2147483647 - 1);
-    out = 7;
-    EXPECT_FALSE(DorTruncateToInt(2147483648.0, out));
-    EXPECT_FALSE(DorTruncateToInt(-2147483649.0, out));
-    EXPECT_FALSE(DorTruncateToInt(std::nan(""), out));
-    EXPECT_FALSE(DorTruncateToInt(-HUGE_VAL, out));
-    EXPECT_EQ(out, 7);
-}
-
-TEST(DirectionAngles, AzimuthFallsBackToZeroWithoutADirection)
-{
-    EXPECT_DOUBLE_EQ(DorAzimuth(DorVector3(-2, 0, 5)), kPi);
-    EXPECT_DOUBLE_EQ(DorAzimuth(DorVector3(0, 3, 0)), kPi / 2);
-    EXPECT_EQ(DorAzimuth(DorVector3(0, 0, 4)), 0.0);        // vertical
-    EXPECT_EQ(DorAzimuth(DorVector3(0.00005, 0, 0)), 0.0);  // too short
+    const struct {
+        double in;
+        bool ok;
+        int out;
+    } rows[] = {{-2.9, true, -2}, {2147483647.9, true, 2147483647}, {-2147483648.9, true, -2147483647 - 1},
+                {2147483648.0, false, 7}, {-2147483649.0, false, 7}, {std::nan(""), false, 7}, {-HUGE_VAL, false, 7}};
+    for (const auto& r : rows) {
+        int out = 7;
+        EXPECT_EQ(DorTruncateToInt(r.in, out), r.ok) << r.in;
+        EXPECT_EQ(out, r.out) << r.in;
+    }
 }

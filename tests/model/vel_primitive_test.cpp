@@ -3,110 +3,63 @@
 #include "model/vel_primitive.h"
 
 namespace {
-void ExpectColour(const DorColorValue& c, float r, float g, float b, float a)
+bool IsColour(const DorColorValue& c, float r, float g, float b, float a)
 {
-    EXPECT_EQ(c.r, r);
-    EXPECT_EQ(c.g, g);
-    EXPECT_EQ(c.b, b);
-    EXPECT_EQ(c.a, a);
-}
-
-CVelTrianglePolys IndexedGroup(int triangleCount)
-{
-    CVelTrianglePolys g;
-    g.GroupType = VelGroupIndexed;
-    g.vertices.SetSize(3);
-    g.triangles.SetSize(triangleCount);
-    g.RenderKind = VelRenderTextured;
-    g.texture = 4;
-    g.lineWidth = 3.0f;
-    g.OverlayFlag = 1;
-    g.material.shininess = 5.0f;
-    return g;
+    return c.r == r && c.g == g && c.b == b && c.a == a;
 }
 }  // namespace
 
-TEST(RecordDefaults, VectorsColourAndVertex)
+TEST(RecordDefaults, VectorsVertexRectangleAndGroup)
 {
-    DorVector3 v3;
-    EXPECT_EQ(v3.dimension, 3);
-    EXPECT_EQ(v3.x, 0.0);
-    EXPECT_EQ(v3.z, 0.0);
-    DorVector2 v2;
-    EXPECT_EQ(v2.dimension, 2);
-    ExpectColour(DorColorValue(), 1, 1, 1, 1);
-
+    EXPECT_EQ(DorVector2().dimension, 2);
     CDorArray<_VelVertex, _VelVertex&> vertices;
-    vertices.SetSize(2);
-    EXPECT_EQ(vertices[1].position.dimension, 3);
-    EXPECT_EQ(vertices[1].normal.dimension, 3);
-    EXPECT_EQ(vertices[1].texcoord.dimension, 2);
-    ExpectColour(vertices[1].colour, 1, 1, 1, 1);
-}
-
-TEST(RecordDefaults, RectangleSizeIgnoresCornerOrder)
-{
-    _DORRECT r = {100, 80, 20, 10};
+    vertices.SetSize(2);  // zero-filled, then constructed
+    const _VelVertex& v = vertices[1];
+    EXPECT_TRUE(v.position.dimension == 3 && v.normal.dimension == 3 && v.texcoord.dimension == 2);
+    EXPECT_TRUE(v.position.x == 0.0 && v.position.z == 0.0 && IsColour(v.colour, 1, 1, 1, 1));
+    _DORRECT r = {100, 80, 20, 10};  // corner order does not matter
     EXPECT_EQ(r.Width(), 80);
     EXPECT_EQ(r.Height(), 70);
-}
 
-TEST(TrianglePolys, DefaultGroupAndItsCopy)
-{
     CVelTrianglePolys g;
-    EXPECT_EQ(g.GroupType, 4);
-    EXPECT_EQ(g.vertices.GetSize(), 0);
-    EXPECT_EQ(g.lineWidth, 1.0f);
-    EXPECT_EQ(g.RenderKind, 0);
-    ExpectColour(g.material.diffuse, 0.8f, 0.8f, 0.0f, 1.0f);
-    ExpectColour(g.material.ambient, 0.4f, 0.4f, 0.0f, 1.0f);
-    ExpectColour(g.material.specular, 1.0f, 1.0f, 0.0f, 1.0f);
-    ExpectColour(g.material.emission, 0.0f, 0.0f, 0.0f, 0.0f);
-    EXPECT_EQ(g.material.shininess, 80.0f);
-
-    CVelTrianglePolys copy(g);
-    EXPECT_EQ(copy.GroupType, 4);
-    EXPECT_EQ(0, std::memcmp(&copy.material, &g.material, sizeof(_DorMaterial)));
+    EXPECT_TRUE(g.GroupType == 4 && g.lineWidth == 1.0f && g.RenderKind == 0);
+    const CVelTrianglePolys copy(g);
+    const _DorMaterial& m = copy.material;
+    EXPECT_TRUE(IsColour(m.diffuse, 0.8f, 0.8f, 0.0f, 1.0f) && IsColour(m.ambient, 0.4f, 0.4f, 0.0f, 1.0f));
+    EXPECT_TRUE(IsColour(m.specular, 1.0f, 1.0f, 0.0f, 1.0f) && IsColour(m.emission, 0.0f, 0.0f, 0.0f, 0.0f));
+    EXPECT_EQ(m.shininess, 80.0f);
 }
 
-TEST(TrianglePolys, RemoveAllResetsTypeKindTextureButKeepsMaterialWidthOverlay)
+TEST(TrianglePolys, AssignmentIsDeepAndRemoveAllKeepsMaterialWidthAndOverlay)
 {
-    CVelTrianglePolys g = IndexedGroup(10);
-    g.RemoveAll();
-    EXPECT_EQ(g.GroupType, 4);
-    EXPECT_EQ(g.vertices.GetSize(), 0);
-    EXPECT_EQ(g.triangles.GetSize(), 0);
-    EXPECT_EQ(g.triangles.maxSize, 0);
-    EXPECT_EQ(g.vertices.data, nullptr);
-    EXPECT_EQ(g.RenderKind, 0);
-    EXPECT_EQ(g.texture, 0u);
-    EXPECT_EQ(g.material.shininess, 5.0f);
-    EXPECT_EQ(g.lineWidth, 3.0f);
-    EXPECT_EQ(g.OverlayFlag, 1);
-}
-
-TEST(TrianglePolys, AssignmentIsDeepAndKeepsDestinationCapacity)
-{
-    CVelTrianglePolys src = IndexedGroup(2);
+    CVelTrianglePolys src;
+    src.GroupType = VelGroupIndexed;
+    src.vertices.SetSize(3);
+    src.triangles.SetSize(2);
+    src.RenderKind = VelRenderTextured;
+    src.texture = 4;
+    src.lineWidth = 3.0f;
+    src.OverlayFlag = 1;
+    src.material.shininess = 5.0f;
     src.vertices[1].position = DorVector3(1, 2, 3);
     src.triangles[1] = _VelTriangleIndex(0, 2, 1);
     CVelTrianglePolys dst;
     dst.vertices.SetSize(40);
     dst = src;
-    EXPECT_EQ(dst.vertices.GetSize(), 3);
-    EXPECT_EQ(dst.vertices.maxSize, 40);
-    EXPECT_NE(dst.vertices.data, src.vertices.data);
-    EXPECT_EQ(dst.vertices[1].position.y, 2.0);
-    EXPECT_EQ(dst.triangles[1].b, 2);
-    EXPECT_EQ(dst.texture, 4u);
-    EXPECT_EQ(dst.OverlayFlag, 1);
-    src.vertices[1].position.y = -1;
-    EXPECT_EQ(dst.vertices[1].position.y, 2.0);
+    src.vertices[1].position.y = -1;  // a deep copy does not follow
+    EXPECT_TRUE(dst.vertices.GetSize() == 3 && dst.vertices.maxSize == 40 && dst.vertices[1].position.y == 2.0);
+    EXPECT_TRUE(dst.triangles[1].b == 2 && dst.texture == 4u && dst.OverlayFlag == 1 && dst.GroupType == 6);
+
+    dst.RemoveAll();
+    EXPECT_TRUE(dst.GroupType == 4 && dst.RenderKind == 0 && dst.texture == 0u);
+    EXPECT_TRUE(dst.vertices.GetSize() == 0 && dst.triangles.GetSize() == 0 && dst.triangles.maxSize == 0);
+    EXPECT_TRUE(dst.material.shininess == 5.0f && dst.lineWidth == 3.0f && dst.OverlayFlag == 1);
 }
 
-TEST(Primitive, AssigningFewerGroupsDestroysSurplusAndKeepsStorage)
+TEST(Primitive, AssigningFewerGroupsKeepsStorageAndDeleteAllKeepsDrawMode)
 {
     CVelPrimitive five;
+    EXPECT_EQ(five.DrawMode, 2);  // pickable by default
     five.groups.SetSize(5);
     five.groups[4].vertices.SetSize(9);
     CVelPrimitive two;
@@ -114,22 +67,10 @@ TEST(Primitive, AssigningFewerGroupsDestroysSurplusAndKeepsStorage)
     two.groups[1].GroupType = VelGroupLines;
     two.DrawMode = 3;
     five = two;
-    EXPECT_EQ(five.groups.GetSize(), 2);
-    EXPECT_EQ(five.groups.maxSize, 5);
-    EXPECT_EQ(five.groups[1].GroupType, 1);
+    EXPECT_TRUE(five.groups.GetSize() == 2 && five.groups.maxSize == 5 && five.groups[1].GroupType == 1);
     EXPECT_EQ(five.DrawMode, 3);
-}
-
-TEST(Primitive, DeleteAllKeepsDrawModeAndDefaultIsPickable)
-{
-    CVelPrimitive p;
-    EXPECT_EQ(p.DrawMode, 2);
-    p.groups.SetSize(3);
-    p.DrawMode = 1;
-    p.DeleteAll();
-    EXPECT_EQ(p.groups.GetSize(), 0);
-    EXPECT_EQ(p.groups.maxSize, 0);
-    EXPECT_EQ(p.DrawMode, 1);
+    five.DeleteAll();
+    EXPECT_TRUE(five.groups.GetSize() == 0 && five.groups.maxSize == 0 && five.DrawMode == 3);
 }
 
 TEST(DrawnElementCount, FollowsTheGroupType)
