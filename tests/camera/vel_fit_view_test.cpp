@@ -54,7 +54,8 @@ void ExpectSameDirection(const _VelCamera& a, const _VelCamera& b)
 }
 }  // namespace
 
-// A long flat slab, off the origin, seen from several directions through wide and tall windows.
+// A long flat slab, off the origin, seen from several directions (one vertical) through wide and
+// tall windows.
 class SlabFit : public ::testing::TestWithParam<int> {
 protected:
     DorVector3 low = DorVector3(10, -4, 2);
@@ -63,8 +64,8 @@ protected:
     _VelCamera Start() const
     {
         static const DorVector3 eyes[] = {DorVector3(0, -100, 30), DorVector3(-50, 20, -40), DorVector3(300, 300, 300),
-                                          DorVector3(40, 1, 3)};
-        static const double aspects[] = {4.0 / 3.0, 0.5, 2.5, 1.0};
+                                          DorVector3(40, 1, 3), DorVector3(40, 1, 300)};  // the last straight down
+        static const double aspects[] = {4.0 / 3.0, 0.5, 2.5, 1.0, 2.0};
         int i = GetParam();
         return Camera(eyes[i], DorVector3(40, 1, 10), 45, aspects[i]);
     }
@@ -98,7 +99,7 @@ TEST_P(SlabFit, BoxFitTouchesTheEdgeAndComesCloser)
     EXPECT_EQ(box.zNear, 1);
 }
 
-INSTANTIATE_TEST_SUITE_P(Views, SlabFit, ::testing::Range(0, 4));
+INSTANTIATE_TEST_SUITE_P(Views, SlabFit, ::testing::Range(0, 5));
 
 TEST(FitView, SphereFitTouchesTheNarrowerFieldOfView)
 {

@@ -13,21 +13,6 @@
 #include "model/dor_math.h"
 #include "support/gl_live_modeller.h"
 
-namespace {
-// A 24-bit bitmap of width texels in one row: black on the left half, white on the right.
-_DorBitmap HalfWhite(int width)
-{
-    _DorBitmap b;
-    b.info.width = width;
-    b.info.height = 1;
-    b.info.bitCount = 24;
-    b.bits.SetSize(DorBitmapRowBytes(width, 24));
-    for (int i = width / 2 * 3; i < width * 3; ++i)
-        b.bits[i] = 255;
-    return b;
-}
-}  // namespace
-
 TEST_F(LiveModeller, ClearsToTheBackgroundColour)
 {
     DorColorValue colour(0.2f, 0.4f, 0.6f, 0.25f);

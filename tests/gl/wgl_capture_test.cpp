@@ -143,6 +143,29 @@ TEST_F(Capture, LargerThanTheWindow)
     ExpectPicture(bitmap);
 }
 
+TEST_F(Capture, TexturesAreUploadedIntoTheBitmapsContext)
+{
+    karvel.Finalize();
+    _DorBitmap texture = HalfWhite(4);
+    ASSERT_EQ(karvel.AddTexture(texture), 1u);
+    HDC dc = window.dc;
+    ASSERT_EQ(karvel.Initialize(dc), 1);
+    LookAlongY(karvel);
+    DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
+    karvel.SetBkColor(grey);
+    CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
+    p.groups[0].RenderKind = VelRenderTextured;
+    p.groups[0].texture = 1;
+    Add(p);
+    _DorBitmap bitmap = Take(0, 0, 200, 100);
+    int col, row;
+    PictureSpot(200, 100, -2, 0, col, row);
+    EXPECT_GT(BitmapPixel(bitmap, col, row).r, 150);  // black texels show the lit red
+    PictureSpot(200, 100, 2, 0, col, row);
+    EXPECT_LT(BitmapPixel(bitmap, col, row).r, 20);  // white ones blend it away
+    EXPECT_TRUE(glIsTexture(1));                     // and again in the window's context
+}
+
 TEST_F(Capture, ZeroOrImpossibleSizeGivesAnEmptyBitmapAndKeepsTheWindow)
 {
     const int sizes[][2] = {{0, 50}, {50, 0}, {0, 0}, {100000, 10}, {10, 100000}};

@@ -72,6 +72,19 @@ inline CVelPrimitive Rectangle(double x0, double z0, double x1, double z1, doubl
     return p;
 }
 
+// A 24-bit bitmap of width texels in one row: black on the left half, white on the right.
+inline _DorBitmap HalfWhite(int width)
+{
+    _DorBitmap b;
+    b.info.width = width;
+    b.info.height = 1;
+    b.info.bitCount = 24;
+    b.bits.SetSize(DorBitmapRowBytes(width, 24));
+    for (int i = width / 2 * 3; i < width * 3; ++i)
+        b.bits[i] = 255;
+    return b;
+}
+
 // Puts the camera 10 units in front of the origin on -y, looking along +y with a 90 degree
 // field of view: x to the right, z up.
 inline void LookAlongY(CVelGLKarvel& karvel)
