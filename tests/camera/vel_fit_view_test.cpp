@@ -71,27 +71,22 @@ protected:
     }
 };
 
-TEST_P(SlabFit, SphereFitShowsEveryCornerAlongTheSameDirection)
-{
-    _VelCamera camera = Start();
-    CVelMathCamera::FitViewToSphere(camera, low, high);
-    ExpectSameDirection(camera, Start());
-    Reach r = ReachOf(camera, low, high);
-    EXPECT_LE(r.edge, 1.0);
-    EXPECT_GT(r.nearest, camera.zNear);
-    EXPECT_LT(r.farthest, camera.zFar);
-    EXPECT_NEAR(camera.target.x, 40, 1e-12);
-    EXPECT_NEAR(camera.target.z, 3.5, 1e-12);
-}
-
-TEST_P(SlabFit, BoxFitTouchesTheEdgeAndComesCloser)
+TEST_P(SlabFit, SphereShowsEveryCornerAndBoxTouchesTheEdgeFromCloser)
 {
     _VelCamera sphere = Start();
     CVelMathCamera::FitViewToSphere(sphere, low, high);
+    ExpectSameDirection(sphere, Start());
+    Reach r = ReachOf(sphere, low, high);
+    EXPECT_LE(r.edge, 1.0);
+    EXPECT_GT(r.nearest, sphere.zNear);
+    EXPECT_LT(r.farthest, sphere.zFar);
+    EXPECT_NEAR(sphere.target.x, 40, 1e-12);
+    EXPECT_NEAR(sphere.target.z, 3.5, 1e-12);
+
     _VelCamera box = Start();
     CVelMathCamera::FitViewToBox(box, low, high);
     ExpectSameDirection(box, Start());
-    Reach r = ReachOf(box, low, high);
+    r = ReachOf(box, low, high);
     EXPECT_NEAR(r.edge, 1.0, 1e-9);
     EXPECT_GT(r.nearest, box.zNear);
     EXPECT_LE(DorLength(box.target - box.eye), DorLength(sphere.target - sphere.eye) + 1e-9);
@@ -113,23 +108,21 @@ TEST(FitView, SphereFitTouchesTheNarrowerFieldOfView)
     }
 }
 
-TEST(FitView, TinyBoxStaysBeyondTheNearPlane)
+TEST(FitView, ClipPlanesNeverCutTheBox)
 {
+    // A tiny box stays beyond a far-out near plane, smaller than a fit but whole.
     DorVector3 low(0, 0, 0), high(0.01, 0.01, 0.01);
     _VelCamera c = Camera(DorVector3(0, -50, 0), DorVector3(0, 0, 0), 60, 1);
     c.zNear = 5;
     CVelMathCamera::FitViewToBox(c, low, high);
     Reach r = ReachOf(c, low, high);
     EXPECT_GT(r.nearest, 5.0);
-    EXPECT_LT(r.edge, 1.0);  // smaller than a fit, but whole
-}
-
-TEST(FitView, HugeBoxPushesTheFarPlaneOut)
-{
-    DorVector3 low(-50000, -50000, 0), high(50000, 50000, 100);
-    _VelCamera c = Camera(DorVector3(0, -50, 10), DorVector3(0, 0, 0), 45, 1);
-    CVelMathCamera::FitViewToBox(c, low, high);
-    Reach r = ReachOf(c, low, high);
+    EXPECT_LT(r.edge, 1.0);
+    // A huge one pushes the far plane out.
+    DorVector3 wideLow(-50000, -50000, 0), wideHigh(50000, 50000, 100);
+    c = Camera(DorVector3(0, -50, 10), DorVector3(0, 0, 0), 45, 1);
+    CVelMathCamera::FitViewToBox(c, wideLow, wideHigh);
+    r = ReachOf(c, wideLow, wideHigh);
     EXPECT_LT(r.farthest, c.zFar);
     EXPECT_LE(r.edge, 1.0 + 1e-9);
 }
