@@ -1,6 +1,7 @@
 #include "gl/vel_capture.h"
 
 #include <cstring>
+#include <new>
 
 bool VelCaptureSizeAllowed(int width, int height, int maxWidth, int maxHeight)
 {
@@ -16,6 +17,16 @@ void VelBeginCaptureBitmap(_DorBitmap& bitmap)
     bitmap.reserved2 = 0;
     bitmap.offBits = 54;
     bitmap.info = DorBitmapInfoHeader{40, 0, 0, 1, 24, 0, 0, 0, 0, 0, 0};
+}
+
+bool VelReserveCaptureBits(_DorBitmap& bitmap, int width, int height)
+{
+    try {
+        bitmap.bits.SetSize(DorBitmapRowBytes(width, 24) * height);
+    } catch (const std::bad_alloc&) {
+        return false;
+    }
+    return true;
 }
 
 void VelEmptyCaptureBitmap(_DorBitmap& bitmap)

@@ -18,6 +18,10 @@ KARVEL_API bool VelCaptureSizeAllowed(int width, int height, int maxWidth, int m
 // height 0, file size 0.
 KARVEL_API void VelBeginCaptureBitmap(_DorBitmap& bitmap);
 
+// Sizes bitmap's pixel array for a width x height capture ahead of the rendering; false when the
+// memory cannot be had (the array is then left as it was).
+KARVEL_API bool VelReserveCaptureBits(_DorBitmap& bitmap, int width, int height);
+
 // Completes an empty capture: no pixels, no palette, width and height 0, file size 54.
 KARVEL_API void VelEmptyCaptureBitmap(_DorBitmap& bitmap);
 

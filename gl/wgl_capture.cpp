@@ -46,7 +46,8 @@ void CVelGLKarvel::ToBitmap(_DorBitmap& bitmap, _DORRECT& rect)
     HDC memoryDC = CreateCompatibleDC(nullptr);
     void* pixels = nullptr;
     HBITMAP dib = memoryDC ? CreateDIBSection(memoryDC, &info, DIB_RGB_COLORS, &pixels, nullptr, 0) : nullptr;
-    if (!dib || !pixels) {
+    // Everything that can fail for want of memory fails here, while the window keeps its context.
+    if (!dib || !pixels || !VelReserveCaptureBits(bitmap, width, height)) {
         if (dib)
             DeleteObject(dib);
         if (memoryDC)

@@ -76,3 +76,14 @@ TEST(CaptureSize, ZeroOversizedAndUnaddressableAreRefused)
     EXPECT_FALSE(VelCaptureSizeAllowed(30000, 30000, 65536, 65536));  // 3.6 GB of rows
     EXPECT_FALSE(VelCaptureSizeAllowed(10, 10, 0, 0));                 // no context to ask
 }
+
+TEST(CaptureBitmap, ReservedBitsAreTheCompletedSize)
+{
+    _DorBitmap bitmap;
+    ASSERT_TRUE(VelReserveCaptureBits(bitmap, 101, 50));
+    EXPECT_EQ(bitmap.bits.GetSize(), 15200);
+    const unsigned char* reserved = bitmap.bits.GetData();
+    std::vector<unsigned char> rows(101 * 50 * 4);
+    VelCompleteCaptureBitmap(bitmap, 101, 50, rows.data());
+    EXPECT_EQ(bitmap.bits.GetData(), reserved);  // no second allocation after the rendering
+}
