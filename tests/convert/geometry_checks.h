@@ -5,6 +5,7 @@
 
 #include <random>
 #include <set>
+#include <string>
 #include <vector>
 
 #include "convert/vel_hole_polygon_to_primitive.h"
@@ -106,6 +107,19 @@ inline Mesh TriangulateHoled(const CDorHolePolygon& shape)
     CVelHolePolygonToPrimitive().TriangulateHolePolygon(&shape, vertices, indices);
     return Mesh{Loop(vertices.GetData(), vertices.GetData() + vertices.GetSize()),
                 std::vector<int>(indices.GetData(), indices.GetData() + indices.GetSize())};
+}
+
+// Each group as its type and record count: P points, L lines, S line strip, T triangle strip,
+// I indexed (others by number).
+inline std::string Layout(const CVelGroupArray& groups)
+{
+    std::string out;
+    for (int g = 0; g < groups.GetSize(); ++g) {
+        int type = groups[g].GroupType;
+        out += (g ? " " : "") + (type >= 0 && type <= 6 ? std::string(1, "PLS3T5I"[type]) : std::to_string(type)) +
+               std::to_string(groups[g].vertices.GetSize());
+    }
+    return out;
 }
 
 inline TriangleSet FanFromZero(int triangles)
