@@ -11,23 +11,18 @@ namespace {
 // area counter-clockwise about their normal.
 void ExpectSolidFace(const CVelGroupArray& front, const CVelGroupArray& back, int vertices, int triangles, double area)
 {
-    ASSERT_EQ(front.GetSize(), 1);
-    ASSERT_EQ(back.GetSize(), 1);
-    for (const CVelTrianglePolys* g : {&front[0], &back[0]}) {
-        EXPECT_EQ(g->GroupType, VelGroupIndexed);
-        ASSERT_EQ(g->vertices.GetSize(), vertices);
-        ASSERT_EQ(g->triangles.GetSize(), triangles);
-        double z = g == &front[0] ? 1 : -1;
-        EXPECT_NEAR(CheckTriangles(MeshOf(*g), DorVector3(0, 0, z)), area, 1e-12);
-        for (int k = 0; k < vertices; ++k) {
-            EXPECT_TRUE(Near(g->vertices[k].normal, 0, 0, z)) << k;
-            EXPECT_TRUE(SamePoint(g->vertices[k].position, front[0].vertices[k].position));
-        }
-    }
-    for (int t = 0; t < triangles; ++t) {
-        EXPECT_EQ(back[0].triangles[t].a, front[0].triangles[t].c);
-        EXPECT_EQ(back[0].triangles[t].b, front[0].triangles[t].b);
-        EXPECT_EQ(back[0].triangles[t].c, front[0].triangles[t].a);
+    ASSERT_EQ(Layout(front), "I" + std::to_string(vertices));
+    ASSERT_EQ(Layout(back), Layout(front));
+    ASSERT_EQ(front[0].triangles.GetSize(), triangles);
+    Mesh m = MeshOf(front[0]), flipped = MeshOf(back[0]);
+    for (size_t t = 0; t < m.i.size(); t += 3)
+        std::swap(m.i[t], m.i[t + 2]);
+    EXPECT_EQ(flipped.i, m.i);
+    for (double z : {1, -1}) {
+        const CVelTrianglePolys& g = z > 0 ? front[0] : back[0];
+        EXPECT_NEAR(CheckTriangles(MeshOf(g), DorVector3(0, 0, z)), area, 1e-12);
+        for (int k = 0; k < vertices; ++k)
+            EXPECT_TRUE(Near(g.vertices[k].normal, 0, 0, z) && SamePoint(g.vertices[k].position, flipped.v[k])) << k;
     }
 }
 
@@ -37,15 +32,10 @@ void ExpectWireLoops(const CVelGroupArray& groups, const std::vector<Loop>& loop
     ASSERT_EQ(groups.GetSize(), static_cast<int>(loops.size()));
     for (size_t l = 0; l < loops.size(); ++l) {
         const CVelTrianglePolys& g = groups[static_cast<int>(l)];
-        EXPECT_EQ(g.GroupType, VelGroupLines);
-        ASSERT_EQ(g.vertices.GetSize(), static_cast<int>(loops[l].size()) + 1);
-        for (int k = 0; k < g.vertices.GetSize(); ++k) {
-            EXPECT_TRUE(SamePoint(g.vertices[k].position, loops[l][k % loops[l].size()])) << l << ", " << k;
-            EXPECT_TRUE(Near(g.vertices[k].normal, 0, 0, z));
-        }
-        EXPECT_EQ(g.material.shininess, shininess);
-        EXPECT_EQ(g.RenderKind, VelRenderLit);
-        EXPECT_EQ(g.texture, 0u);
+        ASSERT_EQ(Layout(groups).substr(3 * l, 2), "L" + std::to_string(loops[l].size() + 1));
+        for (int k = 0; k < g.vertices.GetSize(); ++k)
+            EXPECT_TRUE(SamePoint(g.vertices[k].position, loops[l][k % loops[l].size()]) && Near(g.vertices[k].normal, 0, 0, z)) << l << ", " << k;
+        EXPECT_TRUE(g.material.shininess == shininess && g.RenderKind == VelRenderLit && g.texture == 0u);
     }
 }
 
@@ -88,9 +78,7 @@ TEST_F(UnitSquare, SolidIsOneLitGroupAndReverseOneTurnsIt)
         EXPECT_NEAR(front[0].vertices[k].texcoord.x, square.points[k].x, 1e-12);
         EXPECT_NEAR(front[0].vertices[k].texcoord.y, square.points[k].y, 1e-12);
     }
-    EXPECT_EQ(front[0].material.shininess, 12.0f);
-    EXPECT_EQ(front[0].RenderKind, VelRenderLit);
-    EXPECT_EQ(front[0].texture, 0u);
+    EXPECT_TRUE(front[0].material.shininess == 12.0f && front[0].RenderKind == VelRenderLit && front[0].texture == 0u);
 }
 
 // Texture coordinates u, v as du.x * x + du.y * y + du.z (and dv) of the unit square's corner (x, y).
@@ -113,8 +101,7 @@ TEST_F(UnitSquare, TextureCoordinatesUnderScalesAxesAndOrigins)
         square.textureOrigin = c.origin;
         square.SetTexture(5, c.scaleU, c.scaleV);
         CVelGroupArray groups = Convert(0);
-        EXPECT_EQ(groups[0].RenderKind, VelRenderTextured);
-        EXPECT_EQ(groups[0].texture, 5u);
+        EXPECT_TRUE(groups[0].RenderKind == VelRenderTextured && groups[0].texture == 5u);
         for (int k = 0; k < 4; ++k) {
             double x = square.points[k].x - c.offset.x, y = square.points[k].y - c.offset.y;
             EXPECT_NEAR(groups[0].vertices[k].texcoord.x, c.du.x * x + c.du.y * y + c.du.z, 1e-12) << k;
@@ -139,50 +126,38 @@ TEST_F(UnitSquare, WireIsTheOutlineTwiceUntexturedAndOnlyTheNormalTurns)
     }
 }
 
+// Collinear, empty, missing and one-point outlines; groups appended after what is there.
 TEST(PolygonToPrimitive, DegenerateOutlinesAndAppending)
 {
     CVelPolygonToPrimitive converter;
     CDorPolygon line({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0)}), empty, dot({DorVector3(1, 2, 3)});
+    CDorPolygon square = Polygon(Square(0, 0, 1));
     CVelGroupArray groups;
     for (CDorPolygon* p : {&line, &empty, static_cast<CDorPolygon*>(nullptr)})
         converter.ConvertPolygon(p, groups, 0);
     EXPECT_EQ(groups.GetSize(), 0);
-    empty.SetStyle(DorStyleWire);
-    converter.ConvertPolygon(&empty, groups, 0);
-    EXPECT_EQ(groups.GetSize(), 0);
-    line.SetStyle(DorStyleWire);
-    converter.ConvertPolygon(&line, groups, 1);
-    ASSERT_EQ(groups.GetSize(), 2);
+    line.style = empty.style = dot.style = DorStyleWire;
+    for (CDorPolygon* p : {&line, &empty, &dot, &square})
+        converter.ConvertPolygon(p, groups, 1);
+    EXPECT_EQ(Layout(groups), "L4 L4 L2 L2 I4");
     EXPECT_EQ(DorLength(groups[0].vertices[0].normal), 0.0);
-    dot.SetStyle(DorStyleWire);
-    converter.ConvertPolygon(&dot, groups, 0);  // appended after what is there
-    ASSERT_EQ(groups.GetSize(), 4);
-    EXPECT_EQ(groups[3].vertices.GetSize(), 2);
-    CDorPolygon square = Polygon(Square(0, 0, 1));
-    converter.ConvertPolygon(&square, groups, 0);
-    ASSERT_EQ(groups.GetSize(), 5);
-    EXPECT_EQ(groups[4].GroupType, VelGroupIndexed);
-    EXPECT_EQ(groups[0].vertices.GetSize(), 4);
     const double nan = std::numeric_limits<double>::quiet_NaN();
     CDorPolygon bad({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(1, nan, 0), DorVector3(0, 1, 0)});
     groups.SetSize(0);
     converter.ConvertPolygon(&bad, groups, 0);
     for (int g = 0; g < groups.GetSize(); ++g)
-        for (int t = 0; t < groups[g].triangles.GetSize(); ++t)
-            EXPECT_LT(groups[g].triangles[t].a, groups[g].vertices.GetSize());
+        for (int k : MeshOf(groups[g]).i)
+            EXPECT_LT(k, groups[g].vertices.GetSize());
 }
 
 TEST_F(FaceWithTriangularHole, SolidIsOneLitGroupOverOutlineThenHoleAndFlipTurnsIt)
 {
     CVelGroupArray front = Convert(0);
     ExpectSolidFace(front, Convert(1), 7, 7, 14.0);
-    for (int k = 0; k < 7; ++k) {
-        EXPECT_EQ(front[0].vertices[k].texcoord.x, 0.0);  // untextured: no coordinates
-        EXPECT_EQ(front[0].vertices[k].colour.a, 1.0f);
-    }
+    for (int k = 0; k < 7; ++k)  // untextured: no coordinates
+        EXPECT_TRUE(front[0].vertices[k].texcoord.x == 0.0 && front[0].vertices[k].colour.a == 1.0f);
     EXPECT_TRUE(SamePoint(front[0].vertices[4].position, hole[0]));
-    EXPECT_EQ(front[0].material.shininess, 9.0f);
-    EXPECT_EQ(front[0].RenderKind, VelRenderLit);
+    EXPECT_TRUE(front[0].material.shininess == 9.0f && front[0].RenderKind == VelRenderLit);
     shape.style = 2;
     EXPECT_EQ(Convert(0).GetSize(), 0);
     CVelHolePolygonToPrimitive().ConvertHolePolygon(nullptr, front, 0);
@@ -200,13 +175,11 @@ TEST_F(FaceWithTriangularHole, TextureCoordinatesUseTheHoleTextureVectors)
         shape.holeTextureAxis = turned ? DorVector3(0, 1, 0) : DorVector3();
         shape.holeTextureOrigin = turned ? DorVector3(1, 2, 0) : DorVector3();
         CVelGroupArray groups = Convert(0);
-        const CVelTrianglePolys& g = groups[0];
-        EXPECT_EQ(g.RenderKind, VelRenderTextured);
-        EXPECT_EQ(g.texture, 5u);
-        for (int k = 0; k < g.vertices.GetSize(); ++k) {
-            const DorVector3& p = g.vertices[k].position;
-            EXPECT_NEAR(g.vertices[k].texcoord.x, turned ? -p.y + 1 : p.x / 2, 1e-12) << k;
-            EXPECT_NEAR(g.vertices[k].texcoord.y, turned ? p.x + 2 : p.y / 4, 1e-12) << k;
+        EXPECT_TRUE(groups[0].RenderKind == VelRenderTextured && groups[0].texture == 5u);
+        for (int k = 0; k < groups[0].vertices.GetSize(); ++k) {
+            const DorVector3& p = groups[0].vertices[k].position;
+            EXPECT_NEAR(groups[0].vertices[k].texcoord.x, turned ? -p.y + 1 : p.x / 2, 1e-12) << k;
+            EXPECT_NEAR(groups[0].vertices[k].texcoord.y, turned ? p.x + 2 : p.y / 4, 1e-12) << k;
         }
     }
     shape.SetTexture(5, 0.0, 0.0);
@@ -221,37 +194,30 @@ TEST_F(FaceWithTriangularHole, WireIsOneLoopPerOutlineAndHoleAndOnlyTheNormalTur
     ExpectWireLoops(Convert(1), {Square(0, 0, 4), hole}, -1, 9);
 }
 
+// Without holes a bare triangle is drawn as the triangle 0, 1, 2 itself, a nearly collinear one
+// with its normal unnormalised; fewer than three vertices give nothing; bad holes stay safe.
 TEST(HoleFaceToPrimitive, FallbacksAndBadHoles)
 {
     CVelHolePolygonToPrimitive converter;
     CVelGroupArray groups;
-    // Without holes a bare triangle is drawn as the triangle 0, 1, 2 itself.
     CDorHolePolygon triangle = HolePolygon({DorVector3(0, 0, 0), DorVector3(3, 0, 0), DorVector3(1, 2, 0)}, {});
-    converter.ConvertHolePolygon(&triangle, groups, 0);
-    ASSERT_EQ(groups.GetSize(), 1);
-    ASSERT_EQ(groups[0].triangles.GetSize(), 1);
-    EXPECT_EQ(MeshOf(groups[0]).i, std::vector<int>({0, 1, 2}));
-    // A nearly collinear one keeps its normal unnormalised.
     CDorHolePolygon sliver = HolePolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 1e-6, 0)}, {});
+    CDorHolePolygon segment = HolePolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0)}, {});
+    converter.ConvertHolePolygon(&triangle, groups, 0);
     converter.ConvertHolePolygon(&sliver, groups, 1);
-    ASSERT_EQ(groups.GetSize(), 2);
+    converter.ConvertHolePolygon(&segment, groups, 0);
+    ASSERT_EQ(Layout(groups), "I3 I3");
+    EXPECT_EQ(MeshOf(groups[0]).i, std::vector<int>({0, 1, 2}));
     EXPECT_EQ(MeshOf(groups[1]).i, std::vector<int>({2, 1, 0}));
     EXPECT_TRUE(Near(groups[1].vertices[0].normal, 0, 0, -1e-6, 1e-18));
-    CDorHolePolygon segment = HolePolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0)}, {});
-    converter.ConvertHolePolygon(&segment, groups, 0);
-    EXPECT_EQ(groups.GetSize(), 2);
 
     CDorHolePolygon holes = HolePolygon(Square(0, 0, 4), {{}, {DorVector3(2, 2, 0)}, Square(1, 1, 1)});
     groups.SetSize(0);
     converter.ConvertHolePolygon(&holes, groups, 0);
-    ASSERT_EQ(groups.GetSize(), 1);
-    EXPECT_EQ(groups[0].vertices.GetSize(), 9);
+    ASSERT_EQ(Layout(groups), "I9");
     CheckTriangles(MeshOf(groups[0]), DorVector3(0, 0, 1));
     holes.style = DorStyleWire;
     groups.SetSize(0);
     converter.ConvertHolePolygon(&holes, groups, 0);
-    ASSERT_EQ(groups.GetSize(), 4);
-    EXPECT_EQ(groups[1].vertices.GetSize(), 0);  // nothing to close an empty loop with
-    EXPECT_EQ(groups[2].vertices.GetSize(), 2);  // a point drawn as a zero-length segment
-    EXPECT_EQ(groups[3].vertices.GetSize(), 5);
+    EXPECT_EQ(Layout(groups), "L5 S0 L2 L5");  // an empty loop has nothing to close; a point is a zero-length segment
 }
