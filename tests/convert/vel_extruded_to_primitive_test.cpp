@@ -299,14 +299,10 @@ TEST_F(BlockWithSquareHole, WireIsSideEdgesAndLoopsOfOutlineThenHole)
         for (int i = 0; i < 12; ++i) {
             const CVelTrianglePolys& g = groups[i];
             bool outline = i < 6, side = i % 6 < 4, bottomLoop = i % 6 == 4;
-            EXPECT_EQ(g.vertices[0].position.z, side ? 1.0 : bottomLoop ? 0.0 : 1.0) << i;
-            EXPECT_TRUE(side || SamePoint(g.vertices[4].position, g.vertices[0].position));
-            if (side)
-                EXPECT_EQ(g.vertices[1].position.z, 0.0);
-            if (side)
-                EXPECT_EQ(FacesToward(g, holeCentre), !outline || clockwise) << "side group " << i;
-            else
-                EXPECT_EQ(g.vertices[0].normal.z, bottomLoop != (clockwise && outline) ? -1.0 : 1.0) << i;
+            EXPECT_EQ(g.vertices[0].position.z, bottomLoop ? 0.0 : 1.0) << i;  // sides run top, bottom, top, bottom
+            EXPECT_TRUE(side ? g.vertices[1].position.z == 0.0 : SamePoint(g.vertices[4].position, g.vertices[0].position));
+            EXPECT_TRUE(side ? FacesToward(g, holeCentre) == (!outline || clockwise)
+                             : g.vertices[0].normal.z == (bottomLoop != (clockwise && outline) ? -1.0 : 1.0)) << i;
         }
         EXPECT_EQ(groups[10].material.shininess, 3.0f);
         EXPECT_EQ(block.bottom.points[1].y, clockwise ? 4.0 : 0.0);
