@@ -61,10 +61,8 @@ TEST(MovieFrameFits, OnlyTheStartingSizeAndDepthAreTaken)
 
 TEST(MovieCompressFlags, DataRateWinsOverKeyFrames)
 {
-    EXPECT_EQ(VelMovieCompressFlags(300, 15), kVelCompressDataRate);
-    EXPECT_EQ(VelMovieCompressFlags(1, 0), kVelCompressDataRate);
-    EXPECT_EQ(VelMovieCompressFlags(0, 15), kVelCompressKeyFrames);
-    EXPECT_EQ(VelMovieCompressFlags(-1, 1), kVelCompressKeyFrames);
-    EXPECT_EQ(VelMovieCompressFlags(0, 0), 0u);
-    EXPECT_EQ(VelMovieCompressFlags(-1, -1), 0u);
+    long cases[][3] = {{300, 15, kVelCompressDataRate}, {1, 0, kVelCompressDataRate}, {0, 15, kVelCompressKeyFrames},
+                       {-1, 1, kVelCompressKeyFrames},  {0, 0, 0},                    {-1, -1, 0}};
+    for (auto& c : cases)
+        EXPECT_EQ(VelMovieCompressFlags(c[0], c[1]), uint32_t(c[2])) << c[0] << ", " << c[1];
 }

@@ -182,7 +182,7 @@ TEST_F(MovieFile, FramesAndGdiBitmapsReadBackWithSizeRateNameAndPixels)
     }
 }
 
-TEST_F(MovieFile, StartRefusesAMissingFolderUnplayableDepthsAndNoBitmap)
+TEST_F(MovieFile, StartRefusesAMissingFolderAnUnplayableDepthAndNoBitmap)
 {
     std::string missing = name + ".folder\\movie.avi";
     _DorBitmap frame = Pattern(8, 4, 24, 0);
@@ -194,14 +194,9 @@ TEST_F(MovieFile, StartRefusesAMissingFolderUnplayableDepthsAndNoBitmap)
     DeleteObject(deleted);
     CBitmap none{nullptr};
     EXPECT_EQ(plain.Start(none, path, 15, "m", 1) + plain.Start(deleted, path, 15, "m", 1), 0);
-    for (int bits : {1, 2, 4, 8, 15, 16, 24, 32}) {
+    for (int bits : {2, 4, 15}) {  // the other depths are recorded above
         frame.info.bitCount = static_cast<uint16_t>(bits);
-        frame.bits.SetSize(DorBitmapRowBytes(8, bits) * 4);
-        int playable = bits == 1 || bits == 8 || bits == 16 || bits == 24 || bits == 32;
-        CVelMathMovie_NoComp movie;
-        EXPECT_EQ(movie.Start(frame, path, 15, "d", 1), playable) << bits << " bits";
-        EXPECT_EQ(movie.IsStart(), playable) << bits << " bits";
-        EXPECT_EQ(movie.Add(frame), playable) << bits << " bits";
+        EXPECT_EQ(plain.Start(frame, path, 15, "d", 1) + plain.IsStart(), 0) << bits << " bits";
     }
 }
 
