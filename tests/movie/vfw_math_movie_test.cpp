@@ -147,6 +147,7 @@ void ExpectLifecycle(const char* path)
         ExpectMovie(path, kept);
         ASSERT_EQ(Start(movie, kept[1], path, 1), 1);
         EXPECT_EQ(movie.Add(kept[1]), 1);
+        EXPECT_EQ(movie.frame, 1);  // counted from 0 again
     }
     ExpectMovie(path, {kept[1]});
     EXPECT_TRUE(DeleteFileA(path));  // nothing holds it open any more
@@ -173,8 +174,8 @@ TEST_F(MovieFile, FramesAndGdiBitmapsReadBackWithSizeRateNameAndPixels)
         CBitmap gdi[] = {{CreateDibSectionOf(frames[0])}, {CreateDibSectionOf(frames[1])}};
         CVelMathMovie_NoComp movie;
         ASSERT_EQ(c.gdi ? movie.Start(gdi[0], path, 15, "Camera", 2) : Start(movie, frames[0], path, 2), 1);
-        for (int i = 0; i < 2; ++i)
-            EXPECT_EQ(c.gdi ? movie.Add(gdi[i].handle) : movie.Add(frames[i]), 1);
+        EXPECT_EQ(c.gdi ? movie.Add(gdi[0]) : movie.Add(frames[0]), 1);  // a CBitmap, then its handle
+        EXPECT_EQ(c.gdi ? movie.Add(gdi[1].handle) : movie.Add(frames[1]), 1);
         movie.End();
         ExpectMovie(path, frames);
         for (CBitmap& b : gdi)
