@@ -55,7 +55,8 @@ TEST(MovieFrameFits, OnlyTheStartingSizeAndDepthAreTaken)
 {
     DorBitmapInfoHeader format = Frame(320, 240, 24).info;
     EXPECT_TRUE(VelMovieFrameFits(format, Frame(320, 240, 24)));
-    for (const _DorBitmap& other : {Frame(321, 240, 24), Frame(320, 239, 24), Frame(320, -240, 24), Frame(320, 240, 32)})
+    for (const _DorBitmap& other :
+         {Frame(321, 240, 24), Frame(320, 239, 24), Frame(320, -240, 24), Frame(320, 240, 32)})
         EXPECT_FALSE(VelMovieFrameFits(format, other)) << other.info.width << "x" << other.info.height;
 }
 

@@ -1,4 +1,4 @@
-// Records movies into temporary files and reads them back chunk by chunk, as a player does.
+// Records movies into files and reads them back chunk by chunk, as a player does.
 // NOTE: 64-bit Wine's AVIFileOpenA cannot read these files back (it fails with AVIERR_BADFORMAT
 // looking for the main header), so the RIFF chunks are parsed here instead.
 #include <windows.h>
@@ -62,7 +62,7 @@ void Walk(const Bytes& d, size_t at, size_t end, Chunks& out)
         if (id == "LIST")
             Walk(d, at + 12, at + 8 + size, out);
         else
-            out[id == "00db" || id == "00dc" ? "frame" : id].emplace_back(d.begin() + at + 8, d.begin() + at + 8 + size);
+            out[id == "00db" || id == "00dc" ? "frame" : id].emplace_back(d.data() + at + 8, d.data() + at + 8 + size);
     }
 }
 
@@ -189,7 +189,8 @@ TEST_F(MovieFile, StartRefusesAMissingFolderAnUnplayableDepthAndNoBitmap)
     _DorBitmap frame = Pattern(8, 4, 24, 0);
     CVelMathMovie compressed;  // fails before its dialog could appear
     CVelMathMovie_NoComp plain;
-    EXPECT_EQ(compressed.Start(frame, missing.c_str(), 15, "m", 1) + plain.Start(frame, missing.c_str(), 15, "m", 1), 0);
+    EXPECT_EQ(compressed.Start(frame, missing.c_str(), 15, "m", 1), 0);
+    EXPECT_EQ(plain.Start(frame, missing.c_str(), 15, "m", 1), 0);
     EXPECT_EQ(compressed.IsStart() + plain.IsStart(), 0);
     HBITMAP deleted = CreateDibSectionOf(frame);
     DeleteObject(deleted);
