@@ -278,19 +278,7 @@ TEST_F(LiveModeller, IndicesOutsideTheVerticesAreNeverDrawn)
 
 TEST_F(LiveModeller, TexturedRectangleShowsItsTexture)
 {
-    _DorBitmap texture = HalfWhite(4);
-    karvel.Finalize();
-    ASSERT_EQ(karvel.AddTexture(texture), 1u);
-    HDC dc = window.dc;
-    ASSERT_EQ(karvel.Initialize(dc), 1);
-    LookAlongY(karvel);
-    DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
-    karvel.SetBkColor(grey);
-
-    CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
-    p.groups[0].RenderKind = VelRenderTextured;
-    p.groups[0].texture = 1;
-    Add(p);
+    ASSERT_NO_FATAL_FAILURE(ShowHalfWhiteTexture());
     // The texture environment blends: black texels show the lit colour, white ones black.
     Rgb left = Draw(-2, 0, 0);
     Rgb right = Draw(2, 0, 0);

@@ -145,18 +145,7 @@ TEST_F(Capture, LargerThanTheWindow)
 
 TEST_F(Capture, TexturesAreUploadedIntoTheBitmapsContext)
 {
-    karvel.Finalize();
-    _DorBitmap texture = HalfWhite(4);
-    ASSERT_EQ(karvel.AddTexture(texture), 1u);
-    HDC dc = window.dc;
-    ASSERT_EQ(karvel.Initialize(dc), 1);
-    LookAlongY(karvel);
-    DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
-    karvel.SetBkColor(grey);
-    CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
-    p.groups[0].RenderKind = VelRenderTextured;
-    p.groups[0].texture = 1;
-    Add(p);
+    ASSERT_NO_FATAL_FAILURE(ShowHalfWhiteTexture());
     _DorBitmap bitmap = Take(0, 0, 200, 100);
     int col, row;
     PictureSpot(200, 100, -2, 0, col, row);

@@ -138,6 +138,23 @@ protected:
 
     _DorPosition* Add(CVelPrimitive p) { return karvel.AddPrimitive(p); }
 
+    // Starts the modeller again with HalfWhite(4) as texture 1 and a grey background, and adds
+    // a red rectangle over x -4..4, z -2..2 wearing the texture.
+    void ShowHalfWhiteTexture()
+    {
+        karvel.Finalize();
+        _DorBitmap texture = HalfWhite(4);
+        ASSERT_EQ(karvel.AddTexture(texture), 1u);
+        ASSERT_EQ(karvel.Initialize(window.dc), 1);
+        LookAlongY(karvel);
+        DorColorValue grey(0.5f, 0.5f, 0.5f, 1);
+        karvel.SetBkColor(grey);
+        CVelPrimitive p = Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0));
+        p.groups[0].RenderKind = VelRenderTextured;
+        p.groups[0].texture = 1;
+        Add(p);
+    }
+
     inline static TestWindow* shared = nullptr;
     TestWindow& window = *shared;
     CVelGLKarvel karvel;
