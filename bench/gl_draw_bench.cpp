@@ -6,40 +6,12 @@
 #include <cstdio>
 
 #include "gl/vel_gl_karvel.h"
+#include "gl_bench_model.h"
 #include "support/win32_test_window.h"
 #include "win32_bench.h"
 
 namespace {
 const int kEntities = 20;
-const int kColumns = 100;  // quads per row of one entity's grid
-const int kRows = 50;      // 100 x 50 quads = 10,000 triangles per entity
-
-// A lit grid facing -y, one of kEntities strips stacked along z.
-CVelPrimitive Grid(int strip)
-{
-    CVelTrianglePolys g;
-    g.GroupType = VelGroupIndexed;
-    g.vertices.SetSize((kColumns + 1) * (kRows + 1));
-    for (int r = 0; r <= kRows; ++r) {
-        for (int c = 0; c <= kColumns; ++c) {
-            _VelVertex& v = g.vertices[r * (kColumns + 1) + c];
-            v.position = DorVector3(c * 0.1 - 5, 0, strip * 0.5 + r * 0.01 - 5);
-            v.normal = DorVector3(0, -1, 0);
-        }
-    }
-    for (int r = 0; r < kRows; ++r) {
-        for (int c = 0; c < kColumns; ++c) {
-            int a = r * (kColumns + 1) + c;
-            _VelTriangleIndex lower(a, a + 1, a + kColumns + 2);
-            _VelTriangleIndex upper(a, a + kColumns + 2, a + kColumns + 1);
-            g.triangles.Add(lower);
-            g.triangles.Add(upper);
-        }
-    }
-    CVelPrimitive p;
-    p.groups.Add(g);
-    return p;
-}
 }  // namespace
 
 int main()
@@ -47,19 +19,9 @@ int main()
     TestWindow window(640, 480);
     HDC dc = window.dc;
     CVelGLKarvel karvel;
-    if (!karvel.Initialize(dc)) {
+    if (!LoadBenchModel(karvel, dc, kEntities)) {
         std::printf("no context\n");
         return 0;
-    }
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    camera.eye = DorVector3(0, -12, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 60;
-    karvel.SetCamera(camera);
-    for (int i = 0; i < kEntities; ++i) {
-        CVelPrimitive p = Grid(i);
-        karvel.AddPrimitive(p);
     }
 
     const int runs = 30;

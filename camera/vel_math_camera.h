@@ -49,6 +49,27 @@ public:
     // Glides modeler's camera from `from` toward `to` over duration milliseconds, drawing a frame
     // on dc after each step. Blocks the calling thread; stops a frame short of `to`.
     static void AnimationCamera_Sec(CVelKarvel* modeler, _VelCamera from, _VelCamera to, double duration, HDC dc);
+
+    // Orbits modeler's camera about its target, degreesPerSecond counter-clockwise seen from
+    // above (negative: clockwise), drawing on window's DC and dispatching this thread's messages
+    // between frames (about 60 a second). Returns when the host clears running (from a message
+    // handler), when the window is gone, or on WM_QUIT, which is posted again for the host's own
+    // loop. The camera stays where the orbit stopped; a view straight up or down does not orbit.
+    static void RoundAnimationStart(CVelKarvel* modeler, int& running, HWND window, int degreesPerSecond);
+
+    // Fit-all placements of a camera on the axis-aligned box low..high. Both keep the direction
+    // of view, the field of view and zNear, aim at the box centre and move the eye along the
+    // view line; a camera that cannot be fitted (no direction, a field of view outside 0..180
+    // degrees) is left as it was.
+    // - FitViewToSphere: the sphere around the box touches the narrower of the vertical and
+    //   horizontal field of view. A box without extent keeps the eye's distance.
+    // - FitViewToBox: tighter: the box corners, projected by GetPerspectiveMatrix, touch the
+    //   edge of the view (the vertical edge at 1, the horizontal one at aspect) and none lies
+    //   outside it.
+    // Either way the eye stays far enough back for the whole sphere to lie beyond zNear, and
+    // zFar is pushed out when the sphere would reach past it.
+    static void FitViewToSphere(_VelCamera& camera, const DorVector3& low, const DorVector3& high);
+    static void FitViewToBox(_VelCamera& camera, const DorVector3& low, const DorVector3& high);
 };
 
 // Whether every field of the camera is a finite number.

@@ -65,16 +65,21 @@ void CVelGLKarvel::DrawModel(HDC& dc)
 
 void CVelGLKarvel::SetUpScene()
 {
-    const DorVector3& offset = model.offset;
-    glLoadIdentity();
     renderState->LoadProjection();
-    renderState->LookAt(offset);
-    glTranslatef(static_cast<GLfloat>(-offset.x), static_cast<GLfloat>(-offset.y), static_cast<GLfloat>(-offset.z));
+    LoadViewingTransform();
     renderState->LoadLights();
     glLineWidth(1);
     glPointSize(1);
     glColor3f(1, 1, 1);
     ApplyCullMode();
+}
+
+void CVelGLKarvel::LoadViewingTransform()
+{
+    const DorVector3& offset = model.offset;
+    glLoadIdentity();
+    renderState->LookAt(offset);
+    glTranslatef(static_cast<GLfloat>(-offset.x), static_cast<GLfloat>(-offset.y), static_cast<GLfloat>(-offset.z));
 }
 
 void CVelGLKarvel::ApplyCullMode()

@@ -24,6 +24,14 @@ public:
     // current. Any context held before is released first. Returns 1, or 0 when the pixel format
     // cannot be chosen, set or described.
     int Create(HDC dc);
+    // The same on a memory DC holding a 32-bit DIB section: a single-buffered bitmap format,
+    // chosen, described and then set (the order capture has always used). Returns 1, or 0 with
+    // no context created when a step fails.
+    int CreateOnBitmap(HDC memoryDC);
     // Makes no context current and deletes the one held, if any.
     void Release();
+
+private:
+    // Creates the context on a DC whose pixel format is set and makes it current.
+    int MakeCurrentOn(HDC dc);
 };

@@ -2,6 +2,8 @@
 // camera, cull mode, background and offset.
 #include "gl/vel_gl_karvel.h"
 
+#include "camera/vel_math_camera.h"
+
 CVelGLKarvel::CVelGLKarvel(const CVelGLKarvel& other)
     : CVelKarvel(other), model(other.model), renderState(nullptr), context(other.context), modelScale(other.modelScale)
 {
@@ -66,6 +68,24 @@ void CVelGLKarvel::SetCamera(const _VelCamera& camera)
     if (renderState)
         renderState->SetCamera(camera, modelScale);
 }
+
+// Places the camera on the box of the counted entities with one of the fit-all placements.
+template <class Fit>
+static void FitCameraToModel(CVelGLKarvel& karvel, int filter, Fit fit)
+{
+    DorVector3 low, high;
+    if (!karvel.renderState || !karvel.model.GetBoundingBox(low, high, filter, karvel.modelScale))
+        return;
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    fit(camera, low, high);
+    if (VelCameraIsFinite(camera))
+        karvel.SetCamera(camera);
+}
+
+void CVelGLKarvel::SetCameraForAllView_Low(int filter) { FitCameraToModel(*this, filter, CVelMathCamera::FitViewToSphere); }
+
+void CVelGLKarvel::SetCameraForAllView_Hi(int filter) { FitCameraToModel(*this, filter, CVelMathCamera::FitViewToBox); }
 
 void CVelGLKarvel::GetViewport(_VelViewport& viewport)
 {

@@ -39,14 +39,32 @@ public:
     CDorArray<long, long>* GetFreeProperty(_DorPosition*& position) override;
     void GetCenterPoint(DorVector3& centre, int filter) override;
     void SetOffset(DorVector3& offset) override;
+    // Picking (gl_pick.cpp): the pickable entities under a 5 x 5 pixel square around x, y (y from
+    // the top), nearest first; hidden ones count too. It renders into the back buffer, so
+    // nothing shows until the next frame.
+    void HitTest(HDC dc, int x, int y, CDorArray<_VelSelect, _VelSelect&>& hits) override;
+    // The model point under x, y at window depth 0 (near plane) .. 1 (far plane).
+    void GetDepthToPoint3(HDC dc, int x, int y, double& depth, DorVector3& point) override;
     void DrawModel(HDC& dc) override;
     void DeviceSetting() override;
     void GetBkColor(DorColorValue& colour) override;
     void SetBkColor(DorColorValue& colour) override;
+    // Capture (wgl_capture.cpp): the whole view rendered once at the rectangle's size (its
+    // position is not used) into a 24-bit bitmap. The context visits a memory bitmap and is then
+    // created again on the window, which also resets both viewports to the window's. A size of
+    // zero, or one the GL implementation cannot render, gives an empty bitmap (width and height
+    // 0, no pixels) and leaves the context alone.
+    void ToBitmap(_DorBitmap& bitmap, _DORRECT& rect) override;
     void SetCullMode(int mode) override;
     int GetCullMode() override;
     void GetCamera(_VelCamera& camera) override;
     void SetCamera(const _VelCamera& camera) override;
+    // Fit-all: the camera keeps its direction of view and is placed to show the bounding box of
+    // what GetCenterPoint(filter) counts: _Low fits the box's sphere (CVelMathCamera::
+    // FitViewToSphere), _Hi the box's projected corners (FitViewToBox). An empty model, or no
+    // render state, leaves the camera alone. Nothing is drawn.
+    void SetCameraForAllView_Low(int filter) override;
+    void SetCameraForAllView_Hi(int filter) override;
     void GetViewport(_VelViewport& viewport) override;
     void SetViewport(_VelViewport& viewport) override;
     void ResetViewport() override;
@@ -76,6 +94,8 @@ protected:
     void FollowViewportAspect();
     // Camera projection and view, the model offset, lights, line and colour resets, cull mode.
     void SetUpScene();
+    // The camera's view less the model offset, on a fresh modelview matrix.
+    void LoadViewingTransform();
     // Two-sided mode turns culling off and lights both sides; otherwise back faces are culled.
     void ApplyCullMode();
     // Culling on and the vertex and normal arrays enabled, as every entity pass needs.

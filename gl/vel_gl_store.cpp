@@ -348,11 +348,12 @@ struct Box {
 };
 }  // namespace
 
-void CVelGLStructure::GetCenterPoint(DorVector3& centre, int filter, double modelScale) const
+// The box of every position that GetCenterPoint's entity and group filters let through.
+static Box BoxOfModel(const CDorList& entities, int filter)
 {
     Box box;
     for (_DorPosition* p = entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p)) {
-        const CVelGLEntity* entity = EntityAt(p);
+        const CVelGLEntity* entity = CVelGLStructure::EntityAt(p);
         if (!entity || (entity->DrawMode & 1) || (entity->DrawMode & 4))
             continue;
         for (int g = 0; g < entity->groups.GetSize(); ++g) {
@@ -363,9 +364,25 @@ void CVelGLStructure::GetCenterPoint(DorVector3& centre, int filter, double mode
                 box.Enter(&group.positions[3 * i]);
         }
     }
+    return box;
+}
+
+void CVelGLStructure::GetCenterPoint(DorVector3& centre, int filter, double modelScale) const
+{
+    Box box = BoxOfModel(entities, filter);
     centre.x = (static_cast<double>(box.low[0]) + box.high[0]) * 0.5 / modelScale;
     centre.y = (static_cast<double>(box.low[1]) + box.high[1]) * 0.5 / modelScale;
     centre.z = (static_cast<double>(box.low[2]) + box.high[2]) * 0.5 / modelScale;
+}
+
+bool CVelGLStructure::GetBoundingBox(DorVector3& low, DorVector3& high, int filter, double modelScale) const
+{
+    Box box = BoxOfModel(entities, filter);
+    if (box.empty)
+        return false;
+    low = DorVector3(box.low[0] / modelScale, box.low[1] / modelScale, box.low[2] / modelScale);
+    high = DorVector3(box.high[0] / modelScale, box.high[1] / modelScale, box.high[2] / modelScale);
+    return true;
 }
 
 bool VelTexturePixelsPresent(const _DorBitmap& bitmap)

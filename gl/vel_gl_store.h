@@ -130,6 +130,8 @@ public:
     // Centre of the bounding box of the stored positions of the entities and groups that
     // filter lets through, divided by modelScale; (0, 0, 0) when nothing enters the box.
     void GetCenterPoint(DorVector3& centre, int filter, double modelScale) const;
+    // That box itself, divided by modelScale; false (outputs untouched) when nothing enters it.
+    bool GetBoundingBox(DorVector3& low, DorVector3& high, int filter, double modelScale) const;
 
     unsigned int AddTexture(const _DorBitmap& bitmap);
     int ChangeTexture(unsigned int name, const _DorBitmap& bitmap);

@@ -80,4 +80,11 @@ public:
     void GetDepthToPoint3_Hi(HDC dc, _DorPosition* target, int x, int y, double& depth, DorVector3& point);
     // Glides the camera from `from` to `to` over duration milliseconds, drawing on dc.
     void AnimationCamera(_VelCamera from, _VelCamera to, double duration, HDC dc);
+    // Fit-all with a glide: the camera that SetCameraForAllView_Hi(filter) computes is reached
+    // over duration milliseconds of AnimationCamera on dc, then set exactly and drawn once more.
+    // When the fit leaves the camera as it is (an empty model) nothing is drawn.
+    void KarvelAllmodelView(HDC dc, int filter, double duration);
+    // The same after returning to the reset viewport (applied, with the camera's aspect ratio),
+    // which undoes every ViewportZoom.
+    void KarvelAllmodelView_vp(HDC dc, int filter, double duration);
 };

@@ -11,11 +11,6 @@ namespace {
 const double kNaN = std::numeric_limits<double>::quiet_NaN(), kInf = std::numeric_limits<double>::infinity();
 const double kH = std::sqrt(0.5);
 
-_VelCamera Camera(DorVector3 eye, DorVector3 target, double fovy = 45.0)
-{
-    return {eye, target, fovy, 1.0, 1000.0, 4.0 / 3.0};
-}
-
 void ExpectNear(const DorVector3& actual, const DorVector3& expected, double tolerance, int row)
 {
     EXPECT_NEAR(actual.x, expected.x, tolerance) << "row " << row;

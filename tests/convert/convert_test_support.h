@@ -1,5 +1,5 @@
 #pragma once
-// Geometry checks shared by the converter tests.
+// Outlines shared by the converter tests and the conversion benchmarks.
 #include <cmath>
 #include <vector>
 
@@ -29,7 +29,7 @@ inline std::vector<DorVector3> Star(int tips, double outer, double inner)
     return points;
 }
 
-// An L of six corners: a 2 x 2 square without its upper right unit square.
+// A 2 x 2 square without its upper right unit square.
 inline std::vector<DorVector3> LShape()
 {
     return {DorVector3(0, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 1, 0),
@@ -39,28 +39,6 @@ inline std::vector<DorVector3> LShape()
 inline CDorPolygon Polygon(const std::vector<DorVector3>& points)
 {
     return CDorPolygon(points.data(), static_cast<int>(points.size()));
-}
-
-// The area enclosed by a planar loop: half the length of its Newell normal.
-inline double LoopArea(const std::vector<DorVector3>& points)
-{
-    return DorLength(DorNewellNormal(points.data(), static_cast<int>(points.size()))) * 0.5;
-}
-
-// Twice the signed area of triangle abc seen from the side into which `normal` points.
-inline double SignedDoubleArea(const DorVector3& a, const DorVector3& b, const DorVector3& c, const DorVector3& normal)
-{
-    return DorDot(DorCross(b - a, c - a), normal);
-}
-
-inline DorMatrix4x4 RotationXYZ(double x, double y, double z) { return DorRotateX(x) * DorRotateY(y) * DorRotateZ(z); }
-
-inline std::vector<DorVector3> Transformed(const std::vector<DorVector3>& points, const DorMatrix4x4& m)
-{
-    std::vector<DorVector3> out;
-    for (const DorVector3& p : points)
-        out.push_back(DorTransformPoint(p, m));
-    return out;
 }
 
 }  // namespace convert_test

@@ -1,25 +1,14 @@
-#include <gtest/gtest.h>
-
-#include "convert/dor_shape.h"
+#include "geometry_checks.h"
 #include "model/vel_primitive.h"
-
-namespace {
-bool SamePoint(const DorVector3& a, const DorVector3& b) { return a.x == b.x && a.y == b.y && a.z == b.z; }
-}  // namespace
 
 TEST(ShapeClasses, KindsAndDefaultsAHostCanRelyOn)
 {
     CDorPolygon polygon;
     CDorHolePolygon holed;
     CDorExtruded extruded;
-    CDorHoleExtruded holeExtruded;
     EXPECT_EQ(extruded.kind, 7);
-    EXPECT_EQ(holeExtruded.kind, 8);
-    EXPECT_NE(polygon.kind, 7);
-    EXPECT_NE(polygon.kind, 8);
-    EXPECT_NE(holed.kind, 7);
-    EXPECT_NE(holed.kind, 8);
-    EXPECT_NE(polygon.kind, holed.kind);
+    EXPECT_EQ(CDorHoleExtruded().kind, 8);
+    EXPECT_EQ(std::set<int>({polygon.kind, holed.kind, 7, 8}).size(), 4u);
     EXPECT_EQ(polygon.style, DorStyleSolid);
     EXPECT_EQ(polygon.texture, 0u);
     EXPECT_EQ(polygon.textureScaleU, 1.0);
@@ -29,7 +18,8 @@ TEST(ShapeClasses, KindsAndDefaultsAHostCanRelyOn)
     EXPECT_EQ(polygon.material.shininess, CVelTrianglePolys().material.shininess);
 }
 
-TEST(ShapeClasses, PrismFromOneProfileMovesPointsAndGivenTexturePoints)
+// Points and given texture points move up; a texture point not given stays not given.
+TEST(ShapeClasses, PrismFromOneProfile)
 {
     CDorPolygon base({DorVector3(0, 0, 0), DorVector3(2, 0, 0), DorVector3(0, 2, 0)});
     base.textureOrigin = DorVector3(1, 1, 0);
@@ -38,29 +28,36 @@ TEST(ShapeClasses, PrismFromOneProfileMovesPointsAndGivenTexturePoints)
     EXPECT_TRUE(SamePoint(prism.top.points[1], DorVector3(2, 0, 5)));
     EXPECT_TRUE(SamePoint(prism.bottom.points[1], DorVector3(2, 0, 0)));
     EXPECT_TRUE(SamePoint(prism.top.textureOrigin, DorVector3(1, 1, 5)));
-    EXPECT_TRUE(SamePoint(prism.top.textureAxis, DorVector3(0, 0, 0)));  // not given stays not given
+    EXPECT_TRUE(SamePoint(prism.top.textureAxis, DorVector3(0, 0, 0)));
 }
 
-TEST(ShapeClasses, CopiesAreDeep)
+TEST(ShapeClasses, CopiesAreDeepAndShapesDoNotOwnTheirGeometries)
 {
-    CDorHolePolygon outline({DorVector3(0, 0, 0), DorVector3(4, 0, 0), DorVector3(4, 4, 0), DorVector3(0, 4, 0)});
-    outline.AddHole(CDorPolygon({DorVector3(1, 1, 0), DorVector3(2, 1, 0), DorVector3(2, 2, 0)}));
-    CDorHoleExtruded solid(outline, DorVector3(0, 0, 1));
-    CDorHoleExtruded copy(solid);
-    copy.bottom.holes[0].points[0].x = 99;
-    copy.bottom.points[0].x = 99;
+    CDorHoleExtruded solid(HolePolygon(Square(0, 0, 4), {{DorVector3(1, 1, 0), DorVector3(2, 1, 0), DorVector3(2, 2, 0)}}), DorVector3(0, 0, 1));
+    CDorHoleExtruded copy(solid), assigned;
+    copy.bottom.holes[0].points[0].x = copy.bottom.points[0].x = 99;
     EXPECT_EQ(solid.bottom.holes[0].points[0].x, 1.0);
     EXPECT_EQ(solid.bottom.points[0].x, 0.0);
     ASSERT_EQ(solid.top.holes.GetSize(), 1);
     EXPECT_EQ(solid.top.holes[0].points[2].z, 1.0);
-    CDorHoleExtruded assigned;
     assigned = solid;
     EXPECT_EQ(assigned.top.holes[0].points.GetSize(), 3);
+
+    CDorExtruded a, b;
+    CDorShape shape;
+    shape.Add(&a);
+    shape.Add(&b);
+    CDorShape listed(shape);
+    shape.RemoveAll();
+    ASSERT_EQ(listed.GetCount(), 2);
+    _DorPosition* at = listed.geometries.GetHeadPosition();
+    EXPECT_EQ(CDorList::GetAt(at), static_cast<CDorGeometry*>(&a));
+    EXPECT_EQ(CDorList::GetAt(CDorList::GetNextPosition(at)), static_cast<CDorGeometry*>(&b));
 }
 
 TEST(ShapeClasses, MatchCapsToWallsCopiesTheWallsLook)
 {
-    CDorExtruded box(CDorPolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(0, 1, 0)}), DorVector3(0, 0, 1));
+    CDorExtruded box(Polygon(LShape()), DorVector3(0, 0, 1));
     box.material.shininess = 7;
     box.SetTexture(3, 2.0, 4.0);
     box.SetStyle(DorStyleWire);
@@ -72,19 +69,4 @@ TEST(ShapeClasses, MatchCapsToWallsCopiesTheWallsLook)
         EXPECT_EQ(cap->style, DorStyleWire);
         EXPECT_EQ(cap->kind, DorKindPolygon);
     }
-}
-
-TEST(ShapeClasses, ShapeListsGeometriesInOrderWithoutOwningThem)
-{
-    CDorExtruded a, b;
-    CDorShape shape;
-    shape.Add(&a);
-    shape.Add(&b);
-    CDorShape copy(shape);
-    ASSERT_EQ(copy.GetCount(), 2);
-    _DorPosition* at = copy.geometries.GetHeadPosition();
-    EXPECT_EQ(CDorList::GetAt(at), static_cast<CDorGeometry*>(&a));
-    EXPECT_EQ(CDorList::GetAt(CDorList::GetNextPosition(at)), static_cast<CDorGeometry*>(&b));
-    shape.RemoveAll();
-    EXPECT_EQ(copy.GetCount(), 2);
 }

@@ -1,203 +1,93 @@
-#include <gtest/gtest.h>
-
-#include <cmath>
 #include <limits>
-#include <random>
-#include <set>
 
-#include "convert/vel_polygon_triangulation.h"
-#include "convert_test_support.h"
+#include "geometry_checks.h"
+#include "reference_triangulations.h"
 
-using namespace convert_test;
-
-namespace {
-CDorArray<int, int> Triangulate(const std::vector<DorVector3>& points)
+TEST(PolygonTriangulation, CompleteOutlinesCoverTheirAreaOnce)
 {
-    CDorPolygon polygon = Polygon(points);
-    CDorArray<int, int> indices;
-    TriangulatePolygon(&polygon, indices);
-    return indices;
-}
-
-DorVector3 UnitNormal(const std::vector<DorVector3>& points)
-{
-    DorVector3 n = DorNewellNormal(points.data(), static_cast<int>(points.size()));
-    DorNormalize(n);
-    return n;
-}
-
-// Every index in range, every triangle strictly counter-clockwise about the outline's normal;
-// returns the triangles' total area.
-double CheckTriangles(const std::vector<DorVector3>& points, const CDorArray<int, int>& indices)
-{
-    EXPECT_EQ(indices.GetSize() % 3, 0);
-    DorVector3 normal = UnitNormal(points);
-    const int n = static_cast<int>(points.size());
-    double area = 0;
-    for (int t = 0; t + 2 < indices.GetSize(); t += 3) {
-        for (int k = 0; k < 3; ++k) {
-            EXPECT_GE(indices[t + k], 0);
-            EXPECT_LT(indices[t + k], n);
-            if (indices[t + k] < 0 || indices[t + k] >= n)
-                return -1;
-        }
-        double twice = SignedDoubleArea(points[indices[t]], points[indices[t + 1]], points[indices[t + 2]], normal);
-        EXPECT_GT(twice, 1e-12) << "triangle " << t / 3 << " is clockwise or degenerate";
-        area += twice * 0.5;
+    // The pentagon's point 1 lies on the chord 0-2; the clockwise square follows its own normal.
+    const Loop pentagon = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 2, 0), DorVector3(0, 2, 0)};
+    for (const Loop& outline : {Square(0, 0, 1), Square(0, 0, 1, true), LShape(), Transformed(LShape(), Tilt()), pentagon,
+                                RegularPolygon(60), Star(5, 2.0, 0.8)}) {
+        Mesh m = TriangulatePlain(outline);
+        EXPECT_EQ(m.Count(), static_cast<int>(outline.size()) - 2) << outline.size() << " points";
+        EXPECT_NEAR(CheckRing(m, outline), LoopArea(outline), 1e-9 * LoopArea(outline)) << outline.size() << " points";
     }
-    return area;
 }
 
-void ExpectCoversOnce(const std::vector<DorVector3>& points, const CDorArray<int, int>& indices)
-{
-    double area = CheckTriangles(points, indices);
-    EXPECT_NEAR(area, LoopArea(points), 1e-9 * LoopArea(points));
-    EXPECT_EQ(indices.GetSize() / 3, static_cast<int>(points.size()) - 2);
-}
-
-std::set<std::set<int>> TriangleSet(const CDorArray<int, int>& indices)
-{
-    std::set<std::set<int>> triangles;
-    for (int t = 0; t + 2 < indices.GetSize(); t += 3)
-        triangles.insert({indices[t], indices[t + 1], indices[t + 2]});
-    return triangles;
-}
-}  // namespace
-
-TEST(TriangulateSquare, CounterClockwiseGivesTwoTrianglesCoveringIt)
-{
-    std::vector<DorVector3> square = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(1, 1, 0), DorVector3(0, 1, 0)};
-    CDorArray<int, int> indices = Triangulate(square);
-    ASSERT_EQ(indices.GetSize(), 6);
-    ExpectCoversOnce(square, indices);
-}
-
-TEST(TriangulateSquare, ClockwiseFollowsItsOwnNormal)
-{
-    std::vector<DorVector3> square = {DorVector3(0, 0, 0), DorVector3(0, 1, 0), DorVector3(1, 1, 0), DorVector3(1, 0, 0)};
-    ASSERT_LT(UnitNormal(square).z, 0);
-    CDorArray<int, int> indices = Triangulate(square);
-    ASSERT_EQ(indices.GetSize(), 6);
-    ExpectCoversOnce(square, indices);  // counter-clockwise about -z
-}
-
-TEST(TriangulateTriangle, OneTriangleWhateverTheRotation)
+TEST(PolygonTriangulation, OneTriangleWhateverTheRotation)
 {
     std::mt19937 rng(11);
     std::uniform_real_distribution<double> angle(-kPi, kPi), shift(-50, 50);
-    std::vector<DorVector3> triangle = {DorVector3(0, 0, 0), DorVector3(3, 0, 0), DorVector3(1, 2, 0)};
     for (int trial = 0; trial < 20000; ++trial) {
-        DorMatrix4x4 m = RotationXYZ(angle(rng), angle(rng), angle(rng)) * DorTranslate(shift(rng), shift(rng), shift(rng));
-        std::vector<DorVector3> moved = Transformed(triangle, m);
-        CDorArray<int, int> indices = Triangulate(moved);
-        ASSERT_EQ(indices.GetSize(), 3) << "trial " << trial;
-        ASSERT_GT(CheckTriangles(moved, indices), 0);
+        DorMatrix4x4 m = DorRotateX(angle(rng)) * DorRotateY(angle(rng)) * DorRotateZ(angle(rng)) *
+                         DorTranslate(shift(rng), shift(rng), shift(rng));
+        Loop moved = Transformed({DorVector3(0, 0, 0), DorVector3(3, 0, 0), DorVector3(1, 2, 0)}, m);
+        Mesh t = TriangulatePlain(moved);
+        ASSERT_EQ(t.Count(), 1) << "trial " << trial;
+        ASSERT_GT(CheckTriangles(t, UnitNormal(moved)), 0);
     }
 }
 
-TEST(TriangulateLShape, FourTrianglesNoneOutsideTheL)
+// The list's budget of 100 added edges leaves large outlines partly triangulated.
+TEST(PolygonTriangulation, PartialAtTheBudget)
 {
-    std::vector<DorVector3> l = LShape();
-    CDorArray<int, int> indices = Triangulate(l);
-    ASSERT_EQ(indices.GetSize(), 12);
-    ExpectCoversOnce(l, indices);
-    for (int t = 0; t < indices.GetSize(); t += 3) {
-        DorVector3 centre = (l[indices[t]] + l[indices[t + 1]] + l[indices[t + 2]]) * (1.0 / 3);
-        EXPECT_FALSE(centre.x > 1 && centre.y > 1) << "triangle " << t / 3 << " lies in the notch";
-    }
+    Mesh fan = TriangulatePlain(RegularPolygon(120));
+    CheckRing(fan, RegularPolygon(120));
+    EXPECT_EQ(fan.Triangles(), FanFromZero(99));
+    Loop star = Star(20, 2.0, 1.0);
+    Mesh partial = TriangulatePlain(star);
+    ASSERT_GT(partial.Count(), 0);
+    EXPECT_LE(CheckRing(partial, star), LoopArea(star) * (1 + 1e-12));
+    Loop closed = Square(0, 0, 1);
+    closed.push_back(closed[0]);
+    EXPECT_NEAR(CheckRing(TriangulatePlain(closed), closed), 1.0, 1e-12);
 }
 
-TEST(TriangulateLShape, TiltedInSpaceStillCovered)
+TEST(PolygonTriangulation, WithoutANormalTheIndicesStayAsHandedIn)
 {
-    std::vector<DorVector3> l = Transformed(LShape(), RotationXYZ(0.7, -1.1, 2.3) * DorTranslate(5, -3, 8));
-    ExpectCoversOnce(l, Triangulate(l));
-}
-
-TEST(TriangulatePointOnEdge, NoSegmentPassesThroughTheMiddlePoint)
-{
-    // Point 1 lies on the bottom side: the chord 0-2 would pass through it.
-    std::vector<DorVector3> pentagon = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0),
-                                        DorVector3(2, 2, 0), DorVector3(0, 2, 0)};
-    CDorArray<int, int> indices = Triangulate(pentagon);
-    EXPECT_NEAR(CheckTriangles(pentagon, indices), 4.0, 1e-12);
-    EXPECT_EQ(TriangleSet(indices).count({0, 1, 2}), 0u);
-}
-
-TEST(TriangulateConvex, SixtyPointsCompletely)
-{
-    std::vector<DorVector3> circle = RegularPolygon(60);
-    ExpectCoversOnce(circle, Triangulate(circle));
-}
-
-TEST(TriangulateConvex, HundredTwentyPointsGiveTheFanFromPointZeroToPointHundred)
-{
-    std::vector<DorVector3> circle = RegularPolygon(120);
-    CDorArray<int, int> indices = Triangulate(circle);
-    ASSERT_EQ(indices.GetSize(), 99 * 3);
-    CheckTriangles(circle, indices);
-    std::set<std::set<int>> fan;
-    for (int k = 1; k <= 99; ++k)
-        fan.insert({0, k, k + 1});
-    EXPECT_EQ(TriangleSet(indices), fan);
-}
-
-TEST(TriangulateStar, FortyPointsInRangeCounterClockwiseNoRepeatsNoOverlap)
-{
-    std::vector<DorVector3> star = Star(20, 2.0, 1.0);
-    CDorArray<int, int> indices = Triangulate(star);
-    ASSERT_GT(indices.GetSize(), 0);
-    double area = CheckTriangles(star, indices);
-    EXPECT_LE(area, LoopArea(star) * (1 + 1e-12));
-    EXPECT_EQ(TriangleSet(indices).size(), static_cast<size_t>(indices.GetSize() / 3));
-}
-
-TEST(TriangulateStar, FiveTipsCompletely)
-{
-    std::vector<DorVector3> star = Star(5, 2.0, 0.8);
-    ExpectCoversOnce(star, Triangulate(star));
-}
-
-TEST(TriangulateDegenerate, NoNormalLeavesTheOutputAsHandedIn)
-{
-    const std::vector<std::vector<DorVector3>> outlines = {
-        {},
-        {DorVector3(1, 2, 3)},
-        {DorVector3(0, 0, 0), DorVector3(1, 0, 0)},
-        {DorVector3(0, 0, 0), DorVector3(1, 1, 1), DorVector3(2, 2, 2)},               // collinear
-        {DorVector3(4, 4, 4), DorVector3(4, 4, 4), DorVector3(4, 4, 4), DorVector3(4, 4, 4)},  // one point repeated
+    const std::vector<Loop> outlines = {
+        {}, {DorVector3(1, 2, 3)}, {DorVector3(0, 0, 0), DorVector3(1, 0, 0)},
+        {DorVector3(0, 0, 0), DorVector3(1, 1, 1), DorVector3(2, 2, 2)},
+        {DorVector3(4, 4, 4), DorVector3(4, 4, 4), DorVector3(4, 4, 4), DorVector3(4, 4, 4)},
         {DorVector3(0, 0, 0), DorVector3(1, 1, 0), DorVector3(1, 0, 0), DorVector3(0, 1, 0)},  // figure eight
     };
-    for (const std::vector<DorVector3>& outline : outlines) {
-        CDorPolygon polygon = Polygon(outline);
-        CDorArray<int, int> indices;
-        indices.Add(7);
-        TriangulatePolygon(&polygon, indices);
-        ASSERT_EQ(indices.GetSize(), 1) << outline.size() << " points";
-        EXPECT_EQ(indices[0], 7);
-    }
-}
-
-TEST(TriangulateDegenerate, RepeatedClosingPointStillCovers)
-{
-    std::vector<DorVector3> square = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(1, 1, 0),
-                                      DorVector3(0, 1, 0), DorVector3(0, 0, 0)};
-    CDorArray<int, int> indices = Triangulate(square);
-    EXPECT_NEAR(CheckTriangles(square, indices), 1.0, 1e-12);
-}
-
-TEST(TriangulateDegenerate, NonFiniteCoordinatesGiveIndicesInRangeOrNothing)
-{
+    for (const Loop& outline : outlines)
+        EXPECT_EQ(TriangulatePlain(outline).i, std::vector<int>{7}) << outline.size() << " points";
     const double nan = std::numeric_limits<double>::quiet_NaN(), inf = std::numeric_limits<double>::infinity();
-    for (double bad : {nan, inf, -inf}) {
-        std::vector<DorVector3> outline = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(bad, 1, 0),
-                                           DorVector3(0, 1, 0)};
-        CDorArray<int, int> indices = Triangulate(outline);
-        for (int k = 0; k < indices.GetSize(); ++k) {
-            EXPECT_GE(indices[k], 0);
-            EXPECT_LT(indices[k], 4);
-        }
-    }
+    for (double bad : {nan, inf, -inf})
+        for (int k : TriangulatePlain({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(bad, 1, 0), DorVector3(0, 1, 0)}, false).i)
+            EXPECT_TRUE(k >= 0 && k < 4) << k;
     CDorArray<int, int> untouched;
     TriangulatePolygon(nullptr, untouched);
     EXPECT_EQ(untouched.GetSize(), 0);
+}
+
+// Random outlines in random planes, the budget, reflex and collinear points (a staircase).
+TEST(PolygonTriangulation, SameTrianglesAsThePlainTranscription)
+{
+    std::vector<Loop> outlines = {LShape()};
+    for (int n : {60, 61, 100, 120, 150})
+        outlines.push_back(RegularPolygon(n));
+    for (int tips : {5, 12, 20, 30})
+        outlines.push_back(Star(tips, 2.0, 1.0));
+    for (int steps : {1, 3, 8, 20}) {
+        Loop stairs = {DorVector3(0, 0, 0)};
+        for (int s = 0; s < steps; ++s)
+            stairs.insert(stairs.end(), {DorVector3(s + 1, s, 0), DorVector3(s + 1, s + 1, 0)});
+        stairs.push_back(DorVector3(0, steps, 0));
+        outlines.push_back(stairs);
+    }
+    std::mt19937 rng(2024);
+    std::uniform_int_distribution<int> count(3, 48);
+    std::uniform_real_distribution<double> angle(-kPi, kPi);
+    for (int trial = 0; trial < 300; ++trial) {
+        Loop outline = RandomStarShaped(rng, count(rng), 0, 0, 0.3, 2.0);
+        outlines.push_back(trial % 2 ? Transformed(outline, DorRotateX(angle(rng)) * DorRotateY(angle(rng)) *
+                                                                DorRotateZ(angle(rng)) * DorTranslate(1, 2, 3))
+                                     : outline);
+    }
+    for (size_t k = 0; k < outlines.size(); ++k) {
+        ASSERT_EQ(TriangulatePlain(outlines[k], false).i, reference::Triangulate(Polygon(outlines[k]))) << "outline " << k;
+    }
 }

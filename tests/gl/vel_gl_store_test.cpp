@@ -570,3 +570,25 @@ TEST(IndexRange, EveryIndexMustNameAVertex)
     EXPECT_TRUE(VelIndicesInRange(nullptr, 0, 0));
     EXPECT_FALSE(VelIndicesInRange(ok, 3, 0));
 }
+
+TEST_F(FilteredCentre, BoundingBoxIsTheBoxBehindTheCentre)
+{
+    AddGroup(VelGroupPoints, -100, 1);
+    AddGroup(VelGroupTriangles, 200, 1, 1 | 2);  // hidden: never counts
+    DorVector3 low, high;
+    ASSERT_TRUE(model.GetBoundingBox(low, high, 0, 1.0));
+    DorVector3 centre = Centre(0);
+    EXPECT_EQ((low.x + high.x) / 2, centre.x);
+    EXPECT_EQ((low.y + high.y) / 2, centre.y);
+    EXPECT_EQ(low.x, -100.0);
+    EXPECT_EQ(high.x, 6.0);
+    ASSERT_TRUE(model.GetBoundingBox(low, high, 1, 2.0));  // the points filtered out, scale 2
+    EXPECT_EQ(low.x, 1.0);
+    EXPECT_EQ(high.x, 3.0);
+
+    DorVector3 untouched(7, 7, 7);
+    EXPECT_FALSE(model.GetBoundingBox(untouched, untouched, 4, 1.0));
+    EXPECT_EQ(untouched.x, 7.0);
+    CVelGLStructure empty;
+    EXPECT_FALSE(empty.GetBoundingBox(untouched, untouched, 0, 1.0));
+}

@@ -1,9 +1,22 @@
 #pragma once
-// Bit-for-bit camera comparison that ignores padding and treats NaN as equal to itself: a
-// refused move must leave every field exactly as it was.
+// Cameras for the camera tests, and a bit-for-bit comparison that ignores padding and treats
+// NaN as equal to itself: a refused move must leave every field exactly as it was.
 #include <cstring>
 
 #include "camera/vel_camera.h"
+
+// Clip range 1..1000.
+inline _VelCamera Camera(DorVector3 eye, DorVector3 target, double fovy = 45.0, double aspect = 4.0 / 3.0)
+{
+    _VelCamera c;
+    c.eye = eye;
+    c.target = target;
+    c.fovy = fovy;
+    c.zNear = 1.0;
+    c.zFar = 1000.0;
+    c.aspect = aspect;
+    return c;
+}
 
 inline bool SameCameraBits(const _VelCamera& a, const _VelCamera& b)
 {
