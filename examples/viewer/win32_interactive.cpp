@@ -351,14 +351,8 @@ void ViewerWindow::ResetZoom()
 
 void ViewerWindow::FitAll()
 {
-    _VelCamera from = {}, to = {};
-    view_->modeller.GetCamera(from);
-    view_->modeller.SetCameraForAllView_Low(0);
-    view_->modeller.GetCamera(to);
-    view_->modeller.SetCamera(from);
-    view_->modeller.AnimationCamera(from, to, GlideMs, view_->dc);
-    // The glide stops a step short of its end; land exactly.
-    view_->modeller.SetCamera(to);
+    // Zooms are undone first, so the whole model fits the whole window.
+    view_->modeller.KarvelAllmodelView_vp(view_->dc, 0, GlideMs);
     view_->Draw();
 }
 

@@ -286,7 +286,20 @@ TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
         changed += after.rgb[i] != before.rgb[i];
     EXPECT_GT(changed, 1000u);  // the box was seen from another side
 
-    viewer.Key('F');
-    viewer.Key(VK_ESCAPE);
+    viewer.Mouse(WM_RBUTTONDOWN, MK_RBUTTON, 160, 120);  // pan the model out of the middle
+    for (int x = 170; x <= 300; x += 10)
+        viewer.Mouse(WM_MOUSEMOVE, MK_RBUTTON, x, 120);
+    viewer.Mouse(WM_RBUTTONUP, 0, 300, 120);
+    viewer.Key('S');
+    Picture panned(dir.Path("karvel-snapshot-3.png"));
+    ASSERT_EQ(panned.width, 320);
+    EXPECT_EQ(panned.At(160, 120)[2], 255) << "the middle shows the background after the pan";
+    EXPECT_GT(panned.At(300, 120)[0], 120) << "the box followed the cursor";
+
+    viewer.Key('F');  // fit all brings it back
+    viewer.Key('S');
+    Picture fitted(dir.Path("karvel-snapshot-4.png"));
+    ASSERT_EQ(fitted.width, 320);
+    EXPECT_GT(fitted.At(160, 120)[0], 120);
     EXPECT_EQ(viewer.Close(), 0u);
 }
