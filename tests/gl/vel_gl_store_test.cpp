@@ -121,6 +121,17 @@ void ExpectSameTexture(const CVelTrianglePolys& a, const CVelTrianglePolys& b)
     }
 }
 
+// A bitmap whose pixel array is `missing` bytes shorter than its header claims.
+_DorBitmap Bitmap(int width, int height, int bits = 24, int missing = 0)
+{
+    _DorBitmap b;
+    b.info.width = width;
+    b.info.height = height;
+    b.info.bitCount = static_cast<uint16_t>(bits);
+    b.bits.SetSize(DorBitmapRowBytes(width, bits) * (height < 0 ? -height : height) - missing);
+    return b;
+}
+
 std::vector<CVelGLEntity*> ListOrder(const CVelGLStructure& model)
 {
     std::vector<CVelGLEntity*> out;
@@ -516,11 +527,7 @@ TEST(TextureList, AcceptsPowerOfTwoPixelCountsWithinEachLimit)
         {16, -16, 24, false, false},
     };
     for (const Case& c : cases) {
-        _DorBitmap b;
-        b.info.width = c.width;
-        b.info.height = c.height;
-        b.info.bitCount = static_cast<uint16_t>(c.bits);
-        b.bits.SetSize(DorBitmapRowBytes(c.width, c.bits) * (c.height < 0 ? -c.height : c.height));
+        _DorBitmap b = Bitmap(c.width, c.height, c.bits);
         EXPECT_EQ(VelTextureAcceptable(b, VelAddTextureLimit), c.add) << c.width << "x" << c.height;
         EXPECT_EQ(VelTextureAcceptable(b, VelChangeTextureLimit), c.change) << c.width << "x" << c.height;
     }
@@ -528,24 +535,18 @@ TEST(TextureList, AcceptsPowerOfTwoPixelCountsWithinEachLimit)
 
 TEST(TextureList, ShortPixelArrayIsRefused)
 {
-    _DorBitmap b;
-    b.info.width = 4;
-    b.info.height = 4;
-    b.bits.SetSize(DorBitmapRowBytes(4, 24) * 4 - 1);
-    EXPECT_FALSE(VelTexturePixelsPresent(b));
+    _DorBitmap shortBy1 = Bitmap(4, 4, 24, 1);
+    EXPECT_FALSE(VelTexturePixelsPresent(shortBy1));
     CVelGLStructure model;
-    EXPECT_EQ(model.AddTexture(b), 0u);
-    b.bits.SetSize(DorBitmapRowBytes(4, 24) * 4);
-    EXPECT_EQ(model.AddTexture(b), 1u);
+    EXPECT_EQ(model.AddTexture(shortBy1), 0u);
+    _DorBitmap full = Bitmap(4, 4);
+    EXPECT_EQ(model.AddTexture(full), 1u);
 }
 
 TEST(TextureList, NamesFollowTheListAndChangeReplacesInPlace)
 {
     CVelGLStructure model;
-    _DorBitmap b;
-    b.info.width = 16;
-    b.info.height = 16;
-    b.bits.SetSize(DorBitmapRowBytes(16, 24) * 16);
+    _DorBitmap b = Bitmap(16, 16);
     b.bits[0] = 7;
     EXPECT_EQ(model.AddTexture(b), 1u);
     EXPECT_EQ(model.AddTexture(b), 2u);
