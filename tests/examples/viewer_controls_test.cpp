@@ -4,21 +4,12 @@
 
 #include "camera/vel_math_camera.h"
 #include "model/dor_math.h"
+#include "support/camera_bits.h"
 #include "viewer_controls.h"
 
 namespace {
 // Looking along +y from 20 units away: screen right is +x, screen up is +z.
-_VelCamera LookingNorth()
-{
-    _VelCamera camera = {};
-    camera.eye = DorVector3(0, -20, 0);
-    camera.target = DorVector3(0, 0, 0);
-    camera.fovy = 90.0;
-    camera.zNear = 0.1;
-    camera.zFar = 1000.0;
-    camera.aspect = 1.0;
-    return camera;
-}
+_VelCamera LookingNorth() { return Camera(DorVector3(0, -20, 0), DorVector3(0, 0, 0), 90.0, 1.0); }
 }  // namespace
 
 TEST(ViewerControls, ShortMovesAreClicks)
