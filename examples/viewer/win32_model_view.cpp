@@ -100,8 +100,13 @@ std::vector<PickedEntity> ModelView::Pick(int x, int y, DorVector3& point, _DorP
 
 bool ModelView::Capture(int width, int height, _DorBitmap& bitmap)
 {
+    // NOTE: the capture restarts the window's context, which resets the viewport; a zoomed view
+    // gets its zoom back afterwards (the picture itself always shows the whole view).
+    _VelViewport viewport = {0, 0, 0, 0};
+    modeller.GetViewport(viewport);
     _DORRECT rect = {0, 0, width, height};
     modeller.ToBitmap(bitmap, rect);
+    modeller.SetViewport(viewport);
     return bitmap.info.width == width && bitmap.info.height == height && bitmap.info.bitCount == 24 &&
            bitmap.bits.GetSize() >= DorBitmapRowBytes(width, 24) * height;
 }

@@ -32,8 +32,8 @@ public:
     // The entities under the pixel, nearest first; point is the 3-D point on the nearest and
     // nearest its handle (null when nothing is there).
     std::vector<PickedEntity> Pick(int x, int y, DorVector3& point, _DorPosition*& nearest);
-    // Renders the view at width x height into a 24-bit bitmap; false when no picture of that
-    // size came back.
+    // Renders the whole view, unzoomed, at width x height into a 24-bit bitmap; false when no
+    // picture of that size came back. The window keeps its zoom.
     bool Capture(int width, int height, _DorBitmap& bitmap);
     // After the window changed size: restarts the context, so that the viewport, the aspect
     // ratio and picking follow the new client area. Zooms are reset.

@@ -254,7 +254,8 @@ TEST_F(ViewerBatch, CommandLineMistakesShowTheUsage)
     EXPECT_NE(run.output.find("usage: karvel_viewer"), std::string::npos) << run.output;
 }
 
-// A user's session: a snapshot, a click that picks, a drag that orbits, a fit, and closing.
+// A user's session: snapshots, clicks that pick and highlight, a rubber-band zoom and its reset,
+// an orbit, a pan, a fit, and closing.
 TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
 {
     OpenViewer viewer(Quoted(scene) + " --size 320x240", dir.Path(""));
@@ -270,16 +271,41 @@ TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
     viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 160, 120);
     viewer.Mouse(WM_LBUTTONUP, 0, 161, 120);
     EXPECT_EQ(viewer.StatusText().rfind("red box at (", 0), 0u) << viewer.StatusText();
+    viewer.Key('S');
+    Picture highlighted(dir.Path("karvel-snapshot-2.png"));
+    ASSERT_EQ(highlighted.width, 320);
+    // The warm highlight adds green to the red box.
+    EXPECT_GT(highlighted.At(140, 130)[1], before.At(140, 130)[1] + 40)
+        << int(before.At(140, 130)[1]) << " -> " << int(highlighted.At(140, 130)[1]);
     viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 5, 5);  // on the background: the highlight goes
     viewer.Mouse(WM_LBUTTONUP, 0, 5, 5);
     EXPECT_EQ(viewer.StatusText(), "Nothing here");
+
+    // Shift-drag a rectangle right of the box: four times larger, the box's right edge comes
+    // under (80, 120), where there was only background. Esc takes the zoom back.
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 80, 120);
+    viewer.Mouse(WM_LBUTTONUP, 0, 80, 120);
+    EXPECT_EQ(viewer.StatusText(), "Nothing here");
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON | MK_SHIFT, 160, 90);
+    for (int step = 1; step <= 8; ++step)
+        viewer.Mouse(WM_MOUSEMOVE, MK_LBUTTON | MK_SHIFT, 160 + 10 * step, 90 + 60 * step / 8);
+    viewer.Mouse(WM_LBUTTONUP, MK_SHIFT, 240, 150);
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 80, 120);
+    viewer.Mouse(WM_LBUTTONUP, 0, 80, 120);
+    EXPECT_EQ(viewer.StatusText().rfind("red box at (", 0), 0u) << viewer.StatusText();
+    viewer.Key(VK_ESCAPE);
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 80, 120);
+    viewer.Mouse(WM_LBUTTONUP, 0, 80, 120);
+    EXPECT_EQ(viewer.StatusText(), "Nothing here");
+    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 5, 5);
+    viewer.Mouse(WM_LBUTTONUP, 0, 5, 5);
 
     viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 100, 120);
     for (int x = 110; x <= 200; x += 10)
         viewer.Mouse(WM_MOUSEMOVE, MK_LBUTTON, x, 120);
     viewer.Mouse(WM_LBUTTONUP, 0, 200, 120);
     viewer.Key('S');
-    Picture after(dir.Path("karvel-snapshot-2.png"));
+    Picture after(dir.Path("karvel-snapshot-3.png"));
     ASSERT_EQ(after.rgb.size(), before.rgb.size());
     size_t changed = 0;
     for (size_t i = 0; i < after.rgb.size(); ++i)
@@ -291,14 +317,14 @@ TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
         viewer.Mouse(WM_MOUSEMOVE, MK_RBUTTON, x, 120);
     viewer.Mouse(WM_RBUTTONUP, 0, 300, 120);
     viewer.Key('S');
-    Picture panned(dir.Path("karvel-snapshot-3.png"));
+    Picture panned(dir.Path("karvel-snapshot-4.png"));
     ASSERT_EQ(panned.width, 320);
     EXPECT_EQ(panned.At(160, 120)[2], 255) << "the middle shows the background after the pan";
     EXPECT_GT(panned.At(300, 120)[0], 120) << "the box followed the cursor";
 
     viewer.Key('F');  // fit all brings it back
     viewer.Key('S');
-    Picture fitted(dir.Path("karvel-snapshot-4.png"));
+    Picture fitted(dir.Path("karvel-snapshot-5.png"));
     ASSERT_EQ(fitted.width, 320);
     EXPECT_GT(fitted.At(160, 120)[0], 120);
     EXPECT_EQ(viewer.Close(), 0u);
