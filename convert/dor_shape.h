@@ -51,7 +51,9 @@ protected:
 
 class KARVEL_API CDorPolygon : public CDorGeometry {
 public:
-    CDorArray<DorVector3, DorVector3&> points;
+    // NOTE: aligned so that it starts at the same offset under every compiler: GCC would put it
+    // in the base's tail padding on 32-bit targets, MSVC never does.
+    alignas(8) CDorArray<DorVector3, DorVector3&> points;
     DorVector3 textureAxis;    // texture U runs along it; zero = the plane's own axes
     DorVector3 textureOrigin;  // shifts the texture
 
@@ -70,7 +72,7 @@ public:
 // holeTextureAxis and holeTextureOrigin for the texture.
 class KARVEL_API CDorHolePolygon : public CDorGeometry {
 public:
-    CDorArray<DorVector3, DorVector3&> points;  // the outer outline
+    alignas(8) CDorArray<DorVector3, DorVector3&> points;  // the outer outline; aligned as in CDorPolygon
     DorVector3 textureAxis;    // not read by the holed converters
     DorVector3 textureOrigin;  // not read by the holed converters
     CDorArray<CDorPolygon, CDorPolygon&> holes;  // only each hole's points are read

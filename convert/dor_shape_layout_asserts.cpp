@@ -12,14 +12,12 @@ KARVEL_FIELD(CDorGeometry, textureScaleV, 96);
 KARVEL_FIELD(CDorGeometry, texture, 104);
 KARVEL_SIZE(CDorGeometry, 112);
 
-// NOTE: GCC places a derived class's first member in its base's tail padding, so on 32-bit
-// targets the outline starts at 108, not at sizeof(CDorGeometry).
-KARVEL_FIELD(CDorPolygon, points, KARVEL_PICK(108, 112));
+KARVEL_FIELD(CDorPolygon, points, 112);
 KARVEL_FIELD(CDorPolygon, textureAxis, KARVEL_PICK(128, 136));
 KARVEL_FIELD(CDorPolygon, textureOrigin, KARVEL_PICK(160, 168));
 KARVEL_SIZE(CDorPolygon, KARVEL_PICK(192, 200));
 
-KARVEL_FIELD(CDorHolePolygon, points, KARVEL_PICK(108, 112));
+KARVEL_FIELD(CDorHolePolygon, points, 112);
 KARVEL_FIELD(CDorHolePolygon, textureAxis, KARVEL_PICK(128, 136));
 KARVEL_FIELD(CDorHolePolygon, textureOrigin, KARVEL_PICK(160, 168));
 KARVEL_FIELD(CDorHolePolygon, holes, KARVEL_PICK(192, 200));
