@@ -129,17 +129,16 @@ public:
     void ResetViewport() override { viewport = {0, 0, 640, 480}; }
 };
 
-TEST(AllModelView, GlidesToTheFitAndEndsExactlyOnIt)
+// The glide's easing is pinned by the animation tests; here only where it starts and ends.
+TEST(AllModelView, GlidesFromTheCameraToTheFitAndEndsExactlyOnIt)
 {
     FittingKarvel k;
-    std::vector<double> eyesX;
-    k.onDraw = [&] { eyesX.push_back(k.camera.eye.x); };
+    std::vector<_VelCamera> drawn;
+    k.onDraw = [&] { drawn.push_back(k.camera); };
     k.KarvelAllmodelView(nullptr, 0, 40);
-    ASSERT_GE(eyesX.size(), 2u);
-    for (size_t i = 1; i + 1 < eyesX.size(); ++i)
-        EXPECT_LE(eyesX[i - 1], eyesX[i]);  // steadily toward the fit
-    EXPECT_EQ(k.camera.target.y, 5);
-    EXPECT_EQ(eyesX.back(), 50);  // the last frame is the fit itself
+    ASSERT_GE(drawn.size(), 2u);
+    EXPECT_LT(drawn.front().eye.x, 25);  // nearer the start (0) than the fit (50)
+    EXPECT_TRUE(SameCameraBits(drawn.back(), k.fitted) && SameCameraBits(k.camera, k.fitted));
 }
 
 TEST(AllModelView, NothingToFitDrawsNothingAndTheViewportVariantResetsBeforeFitting)
