@@ -12,6 +12,17 @@
 #include "model/dor_math.h"
 #include "support/gl_live_modeller.h"
 
+// Scenes read at several places per drawn frame.
+class LiveScene : public LiveModeller {
+protected:
+    Rgb At(double x, double z)
+    {
+        int col, row;
+        PixelOf(x, 0, z, col, row);
+        return PixelAt(col, row);
+    }
+};
+
 TEST_F(LiveModeller, ClearsToTheBackgroundColour)
 {
     DorColorValue colour(0.2f, 0.4f, 0.6f, 0.25f);
@@ -149,26 +160,28 @@ TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
 
 // On the left two opaque rectangles at equal depth; on the right a half-transparent red one
 // in front of a far opaque blue one.
-TEST_F(LiveModeller, ListOrderDecidesOverlapAndTransparentGroupsBlendWithoutDepth)
+TEST_F(LiveScene, ListOrderDecidesOverlapAndTransparentGroupsBlendWithoutDepth)
 {
     _DorPosition* red = Add(Rectangle(-8, -2, -4, 2, 0, Matte(1, 0, 0)));
     Add(Rectangle(-8, -2, -4, 2, 0, Matte(0, 1, 0)));
     Add(Rectangle(2, -4, 10, 4, 5, Matte(0, 0, 1)));
     Add(Rectangle(4, -2, 8, 2, 0, Matte(1, 0, 0, 0.5f)));
-    Rgb first = Draw(-6, 0, 0);
+    karvel.DrawModel(window.dc);
+    Rgb first = At(-6, 0);
     EXPECT_GT(first.r, 150);
     EXPECT_LT(first.g, 30);
-    Rgb blended = Draw(6, 0, 0);
+    Rgb blended = At(6, 0);
     EXPECT_GT(blended.r, 60);
     EXPECT_GT(blended.b, 40);
 
     karvel.MoveDepthToTail(red);
     // Green behind the red one but drawn after it still shows: the red wrote no depth.
-    Add(Rectangle(5, -1, 7, 1, 2, Matte(0, 1, 0)));
-    Rgb second = Draw(-6, 0, 0);
+    Add(Rectangle(5, -1, 9, 1, 2, Matte(0, 1, 0)));
+    karvel.DrawModel(window.dc);
+    Rgb second = At(-6, 0);
     EXPECT_GT(second.g, 150);
     EXPECT_LT(second.r, 30);
-    Rgb behind = Draw(6, 0, 0);
+    Rgb behind = At(6, 0);
     EXPECT_GT(behind.g, 150);
     EXPECT_LT(behind.r, 30);
 }
@@ -198,7 +211,7 @@ TEST_F(LiveModeller, OverlayGroupIsPlacedInWindowPixelsUnlit)
 // Three rectangles side by side, read in the same frames: per-vertex blue on the left, a
 // yellow back face in the middle, green on the right beside groups whose indices leave the
 // vertex array.
-TEST_F(LiveModeller, VertexColourBackFaceAndBadIndicesInOneScene)
+TEST_F(LiveScene, VertexColourBackFaceAndBadIndicesInOneScene)
 {
     CVelPrimitive coloured = Rectangle(-9, -3, -5, 3, 0, Matte(0, 0, 0));
     CVelTrianglePolys& g = coloured.groups[0];
@@ -227,23 +240,25 @@ TEST_F(LiveModeller, VertexColourBackFaceAndBadIndicesInOneScene)
     for (int cull : {0, 5}) {
         karvel.SetCullMode(cull);
         EXPECT_EQ(karvel.GetCullMode(), cull);
-        Rgb left = Draw(-7, 0, 0);
+        karvel.DrawModel(window.dc);
+        Rgb left = At(-7, 0);
         EXPECT_GT(left.b, 30) << cull;  // the vertex colour, through the ambient terms only
         EXPECT_LT(left.r, 5) << cull;
-        EXPECT_TRUE(IsBackground(Draw(0, 0, 0))) << cull;  // back faces stay culled in both modes
-        EXPECT_GT(Draw(7, 0, 0).g, 150) << cull;  // the valid group still draws
+        EXPECT_TRUE(IsBackground(At(0, 0))) << cull;  // back faces stay culled in both modes
+        EXPECT_GT(At(7, 0).g, 150) << cull;  // the valid group still draws
     }
     GLint twoSided = 0;
     glGetIntegerv(GL_LIGHT_MODEL_TWO_SIDE, &twoSided);
     EXPECT_EQ(twoSided, 1);
 }
 
-TEST_F(LiveModeller, TexturedRectangleShowsItsTexture)
+TEST_F(LiveScene, TexturedRectangleShowsItsTexture)
 {
     ASSERT_NO_FATAL_FAILURE(ShowHalfWhiteTexture());
     // The texture environment blends: black texels show the lit colour, white ones black.
-    Rgb left = Draw(-2, 0, 0);
-    Rgb right = Draw(2, 0, 0);
+    karvel.DrawModel(window.dc);
+    Rgb left = At(-2, 0);
+    Rgb right = At(2, 0);
     EXPECT_GT(left.r, 150);
     EXPECT_LT(right.r, 20);
     EXPECT_LT(right.g, 20);
