@@ -316,12 +316,8 @@ TEST(EntityStore, HandlesStayValidAcrossRemovalsAndMoves)
     EXPECT_EQ(order.back(), CVelGLStructure::EntityAt(handles[1]));
 }
 
-TEST(EntityStore, MovingTheOnlyEntityWritesBackAUsableHandle)
+TEST_F(SquareAndStripEntity, MovingTheOnlyEntityWritesBackAUsableHandle)
 {
-    CVelGLStructure model;
-    CVelGLScope scope;
-    CVelPrimitive p = SquareAndStrip();
-    _DorPosition* handle = model.AddPrimitive(p, scope);
     CVelGLEntity* entity = CVelGLStructure::EntityAt(handle);
     model.MoveToHead(handle);
     ASSERT_NE(handle, nullptr);
@@ -356,12 +352,8 @@ TEST(EntityStore, EmptyPrimitiveAndUnknownGroupType)
     EXPECT_EQ(stored.elementCount, 2);  // 7 vertices make 2 triangles
 }
 
-TEST(EntityStore, CopiesOwnTheirEntities)
+TEST_F(SquareAndStripEntity, CopiesOwnTheirEntities)
 {
-    CVelGLStructure model;
-    CVelGLScope scope;
-    CVelPrimitive p = SquareAndStrip();
-    model.AddPrimitive(p, scope);
     CVelGLStructure copy(model);
     model.Destroy();
     ASSERT_EQ(copy.entities.GetCount(), 1);
