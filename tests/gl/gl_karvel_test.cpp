@@ -106,13 +106,13 @@ TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoItAndResetLeavesGLUntilTheN
     karvel.SetViewport(upperHalf);
     karvel.GetCamera(camera);
     EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 60.0);
-    karvel.ResetViewport();
+    karvel.ResetViewport();  // back to the viewport Initialize was given
     karvel.GetViewport(now);
-    EXPECT_EQ(now.width, kWidth);
-    EXPECT_EQ(now.height, kHeight);
+    EXPECT_EQ(now.width, kWidth / 2);
+    EXPECT_EQ(now.height, kHeight / 2);
     karvel.DrawModel(dc);
     glGetIntegerv(GL_VIEWPORT, gl);
-    EXPECT_EQ(gl[3], kHeight / 2);
+    EXPECT_EQ(gl[2], kWidth);
     karvel.GetCamera(camera);
     EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 60.0);
 }
