@@ -12,6 +12,17 @@
 #include "model/dor_math.h"
 #include "support/gl_live_modeller.h"
 
+// Scenes read at several places per drawn frame.
+class LiveScene : public LiveModeller {
+protected:
+    Rgb At(double x, double z)
+    {
+        int col, row;
+        PixelOf(x, 0, z, col, row);
+        return PixelAt(col, row);
+    }
+};
+
 TEST_F(LiveModeller, ClearsToTheBackgroundColour)
 {
     DorColorValue colour(0.2f, 0.4f, 0.6f, 0.25f);
@@ -69,7 +80,7 @@ TEST_F(LiveModeller, TriangleFacingASlopedCameraAppearsWhereTheViewMatrixPutsIt)
         EXPECT_TRUE(IsBackground(pixel(beside)));
 }
 
-TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
+TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoItAndResetLeavesGLUntilTheNextSet)
 {
     karvel.Finalize();
     HDC dc = window.dc;
@@ -90,6 +101,20 @@ TEST_F(LiveModeller, InitializeWithAViewportDrawsIntoIt)
     karvel.DrawModel(dc);
     EXPECT_GT(PixelAt(kWidth / 4, kHeight * 3 / 4).g, 150);  // centre of the lower-left quarter
     EXPECT_TRUE(IsBackground(PixelAt(kWidth / 2, kHeight / 2)));
+
+    _VelViewport upperHalf = {0, 0, kWidth, kHeight / 2};
+    karvel.SetViewport(upperHalf);
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 60.0);
+    karvel.ResetViewport();  // back to the viewport Initialize was given
+    karvel.GetViewport(now);
+    EXPECT_EQ(now.width, kWidth / 2);
+    EXPECT_EQ(now.height, kHeight / 2);
+    karvel.DrawModel(dc);
+    glGetIntegerv(GL_VIEWPORT, gl);
+    EXPECT_EQ(gl[2], kWidth);
+    karvel.GetCamera(camera);
+    EXPECT_DOUBLE_EQ(camera.aspect, 160.0 / 60.0);
 }
 
 TEST_F(LiveModeller, EachLineGroupSetsItsOwnWidth)
@@ -133,29 +158,30 @@ TEST_F(LiveModeller, HiddenEntitiesDrawNothing)
     EXPECT_EQ(karvel.GetDrawMode(rect), 2);
 }
 
-TEST_F(LiveModeller, ListOrderDecidesOverlapAtEqualDepth)
+// On the left two opaque rectangles at equal depth; on the right a half-transparent red one
+// in front of a far opaque blue one.
+TEST_F(LiveScene, ListOrderDecidesOverlapAndTransparentGroupsBlendWithoutDepth)
 {
-    _DorPosition* red = Add(Rectangle(-2, -2, 2, 2, 0, Matte(1, 0, 0)));
-    Add(Rectangle(-2, -2, 2, 2, 0, Matte(0, 1, 0)));
-    Rgb first = Draw(0, 0, 0);
+    _DorPosition* red = Add(Rectangle(-8, -2, -4, 2, 0, Matte(1, 0, 0)));
+    Add(Rectangle(-8, -2, -4, 2, 0, Matte(0, 1, 0)));
+    Add(Rectangle(2, -4, 10, 4, 5, Matte(0, 0, 1)));
+    Add(Rectangle(4, -2, 8, 2, 0, Matte(1, 0, 0, 0.5f)));
+    karvel.DrawModel(window.dc);
+    Rgb first = At(-6, 0);
     EXPECT_GT(first.r, 150);
     EXPECT_LT(first.g, 30);
-    karvel.MoveDepthToTail(red);
-    Rgb second = Draw(0, 0, 0);
-    EXPECT_GT(second.g, 150);
-    EXPECT_LT(second.r, 30);
-}
-
-TEST_F(LiveModeller, TransparentGroupBlendsAndLeavesDepthUnwritten)
-{
-    Add(Rectangle(-4, -4, 4, 4, 5, Matte(0, 0, 1)));        // far, opaque blue
-    Add(Rectangle(-2, -2, 2, 2, 0, Matte(1, 0, 0, 0.5f)));  // near, half-transparent red
-    Rgb blended = Draw(0, 0, 0);
+    Rgb blended = At(6, 0);
     EXPECT_GT(blended.r, 60);
     EXPECT_GT(blended.b, 40);
+
+    karvel.MoveDepthToTail(red);
     // Green behind the red one but drawn after it still shows: the red wrote no depth.
-    Add(Rectangle(-1, -1, 1, 1, 2, Matte(0, 1, 0)));
-    Rgb behind = Draw(0, 0, 0);
+    Add(Rectangle(5, -1, 9, 1, 2, Matte(0, 1, 0)));
+    karvel.DrawModel(window.dc);
+    Rgb second = At(-6, 0);
+    EXPECT_GT(second.g, 150);
+    EXPECT_LT(second.r, 30);
+    Rgb behind = At(6, 0);
     EXPECT_GT(behind.g, 150);
     EXPECT_LT(behind.r, 30);
 }
@@ -182,80 +208,60 @@ TEST_F(LiveModeller, OverlayGroupIsPlacedInWindowPixelsUnlit)
     EXPECT_TRUE(IsBackground(PixelAt(10, kHeight - 20)));
 }
 
-TEST_F(LiveModeller, PerVertexColourIsDrawnImmediately)
+// Three rectangles side by side, read in the same frames: per-vertex blue on the left, a
+// yellow back face in the middle, green on the right beside groups whose indices leave the
+// vertex array.
+TEST_F(LiveScene, VertexColourBackFaceAndBadIndicesInOneScene)
 {
-    CVelPrimitive p = Rectangle(-3, -3, 3, 3, 0, Matte(0, 0, 0));
-    CVelTrianglePolys& g = p.groups[0];
+    CVelPrimitive coloured = Rectangle(-9, -3, -5, 3, 0, Matte(0, 0, 0));
+    CVelTrianglePolys& g = coloured.groups[0];
     g.RenderKind = VelRenderVertexColour;
     for (int i = 0; i < g.vertices.GetSize(); ++i)
         g.vertices[i].colour = DorColorValue(0, 0, 1, 1);
-    Add(p);
-    Rgb c = Draw(0, 0, 0);
-    EXPECT_GT(c.b, 30);  // the vertex colour, through the ambient terms only
-    EXPECT_LT(c.r, 5);
-}
+    Add(coloured);
 
-TEST_F(LiveModeller, BackFacesStayCulledForEntitiesInBothCullModes)
-{
-    CVelPrimitive p = Rectangle(-2, -2, 2, 2, 0, Matte(1, 1, 0));
-    std::swap(p.groups[0].vertices[1], p.groups[0].vertices[2]);  // clockwise: a back face
-    Add(p);
+    CVelPrimitive back = Rectangle(-2, -2, 2, 2, 0, Matte(1, 1, 0));
+    std::swap(back.groups[0].vertices[1], back.groups[0].vertices[2]);  // clockwise
+    Add(back);
+
+    CVelPrimitive valid = Rectangle(5, -2, 9, 2, 0, Matte(0, 1, 0));
+    CVelTrianglePolys bad = valid.groups[0];
+    bad.GroupType = VelGroupIndexed;
+    bad.material = Matte(1, 0, 0);
+    _VelTriangleIndex t(0, 1, 4000000);
+    bad.triangles.Add(t);
+    CVelTrianglePolys wrapped = bad;
+    wrapped.triangles[0] = _VelTriangleIndex(0, -1, 2);
+    valid.groups.Add(bad);
+    valid.groups.Add(wrapped);
+    Add(valid);
+
     EXPECT_EQ(karvel.GetCullMode(), 0);
-    EXPECT_TRUE(IsBackground(Draw(0, 0, 0)));
-    karvel.SetCullMode(5);
-    EXPECT_EQ(karvel.GetCullMode(), 5);
-    EXPECT_TRUE(IsBackground(Draw(0, 0, 0)));
+    for (int cull : {0, 5}) {
+        karvel.SetCullMode(cull);
+        EXPECT_EQ(karvel.GetCullMode(), cull);
+        karvel.DrawModel(window.dc);
+        Rgb left = At(-7, 0);
+        EXPECT_GT(left.b, 30) << cull;  // the vertex colour, through the ambient terms only
+        EXPECT_LT(left.r, 5) << cull;
+        EXPECT_TRUE(IsBackground(At(0, 0))) << cull;  // back faces stay culled in both modes
+        EXPECT_GT(At(7, 0).g, 150) << cull;  // the valid group still draws
+    }
     GLint twoSided = 0;
     glGetIntegerv(GL_LIGHT_MODEL_TWO_SIDE, &twoSided);
     EXPECT_EQ(twoSided, 1);
 }
 
-TEST_F(LiveModeller, IndicesOutsideTheVerticesAreNeverDrawn)
-{
-    CVelPrimitive p = Rectangle(-2, -2, 2, 2, 0, Matte(1, 0, 0));
-    CVelTrianglePolys bad = p.groups[0];
-    bad.GroupType = VelGroupIndexed;
-    _VelTriangleIndex t(0, 1, 4000000);
-    bad.triangles.Add(t);
-    CVelTrianglePolys wrapped = bad;
-    wrapped.triangles[0] = _VelTriangleIndex(0, -1, 2);
-    p.groups.Add(bad);
-    p.groups.Add(wrapped);
-    p.groups[0].material = Matte(0, 1, 0);
-    Add(p);
-    Rgb c = Draw(0, 0, 0);
-    EXPECT_GT(c.g, 150);  // the valid group still draws
-}
-
-TEST_F(LiveModeller, TexturedRectangleShowsItsTexture)
+TEST_F(LiveScene, TexturedRectangleShowsItsTexture)
 {
     ASSERT_NO_FATAL_FAILURE(ShowHalfWhiteTexture());
     // The texture environment blends: black texels show the lit colour, white ones black.
-    Rgb left = Draw(-2, 0, 0);
-    Rgb right = Draw(2, 0, 0);
+    karvel.DrawModel(window.dc);
+    Rgb left = At(-2, 0);
+    Rgb right = At(2, 0);
     EXPECT_GT(left.r, 150);
     EXPECT_LT(right.r, 20);
     EXPECT_LT(right.g, 20);
-}
-
-TEST_F(LiveModeller, ResetViewportLeavesTheGLViewportUntilSetViewport)
-{
-    _VelViewport quarter = {0, 0, kWidth / 2, kHeight / 2};
-    karvel.SetViewport(quarter);
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
-    karvel.ResetViewport();
-    _VelViewport now;
-    karvel.GetViewport(now);
-    EXPECT_EQ(now.width, kWidth);
-    EXPECT_EQ(now.height, kHeight);
-    karvel.DrawModel(window.dc);
-    GLint gl[4];
-    glGetIntegerv(GL_VIEWPORT, gl);
-    EXPECT_EQ(gl[2], kWidth / 2);
-    karvel.GetCamera(camera);
-    EXPECT_DOUBLE_EQ(camera.aspect, 80.0 / 60.0);
 }
 
 TEST_F(LiveModeller, LightZeroFollowsTheCameraAtEveryFrame)
