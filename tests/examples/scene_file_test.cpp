@@ -39,6 +39,13 @@ protected:
 const char* kWall = R"({"name": "wall", "type": "extrusion",
     "profile": [[0, 0, 0], [4, 0, 0], [4, 0, 3], [0, 0, 3]], "extrude": [0, 0.2, 0]})";
 
+// A triangular prism named name, with the extra members given.
+std::string Prism(const std::string& name, const std::string& more)
+{
+    return R"({"name": ")" + name + R"(", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]], "extrude": [0,0,1], )" +
+           more + "}";
+}
+
 double Distance(const DorVector3& a, const DorVector3& b) { return DorLength(a - b); }
 }  // namespace
 
@@ -99,8 +106,7 @@ TEST_F(SceneFileTest, ExtrusionTopIsTheProfileMovedAndCapsFollowTheWalls)
 
 TEST_F(SceneFileTest, MaterialPartsOverrideTheColour)
 {
-    ASSERT_TRUE(Parse(SceneWith(R"({"name": "m", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]],
-        "extrude": [0,0,1], "material": {"color": [0, 0, 1, 0.5], "ambient": [0.1, 0.2, 0.3], "shininess": 100}})")))
+    ASSERT_TRUE(Parse(SceneWith(Prism("m", R"("material": {"color": [0, 0, 1, 0.5], "ambient": [0.1, 0.2, 0.3], "shininess": 100})"))))
         << error;
     const _DorMaterial& m = scene.entities[0]->geometry->material;
     EXPECT_FLOAT_EQ(m.diffuse.b, 1.0f);
@@ -211,12 +217,9 @@ TEST_F(SceneFileTest, TexturesAreReadOnceAndSharedByName)
 {
     dir.Write("tiles.bmp", BmpFile(16, 16, 24));
     dir.Write("wood.bmp", BmpFile(8, 4, 32));
-    ASSERT_TRUE(Parse(SceneWith(R"({"name": "a", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]],
-            "extrude": [0,0,1], "texture": {"file": "tiles.bmp", "scale": [2, 0.5], "axis": [0, 0, 1], "capAxis": [1, 0, 0]}},
-        {"name": "b", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]], "extrude": [0,0,1],
-            "texture": {"file": "wood.bmp"}},
-        {"name": "c", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]], "extrude": [0,0,1],
-            "texture": {"file": "tiles.bmp"}})")))
+    ASSERT_TRUE(Parse(SceneWith(
+        Prism("a", R"("texture": {"file": "tiles.bmp", "scale": [2, 0.5], "axis": [0, 0, 1], "capAxis": [1, 0, 0]})") + "," +
+        Prism("b", R"("texture": {"file": "wood.bmp"})") + "," + Prism("c", R"("texture": {"file": "tiles.bmp"})"))))
         << error;
     ASSERT_EQ(scene.textures.size(), 2u);
     EXPECT_EQ(scene.textures[0]->bitmap.info.width, 16);
@@ -314,7 +317,6 @@ TEST_F(SceneFileTest, UnreadableTexturesAreNamed)
                         "\" is 1024 x 512)"},
     };
     for (const Case& c : cases)
-        EXPECT_EQ(Refusal(SceneWith(R"({"name": "t", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]],
-            "extrude": [0,0,1], "texture": {"file": ")" + c.file + "\"}}")),
+        EXPECT_EQ(Refusal(SceneWith(Prism("t", R"("texture": {"file": ")" + c.file + "\"}"))),
                   "test.json: entities[0] (\"t\").texture.file: expected " + c.message);
 }
