@@ -89,10 +89,14 @@ public:
     // Sent, not posted: each message is handled before the next one is sent.
     void Mouse(UINT message, WPARAM keys, int x, int y) { SendMessageA(view, message, keys, MAKELPARAM(x, y)); }
     void Key(WPARAM key) { SendMessageA(view, WM_KEYDOWN, key, 0); }
-    void Click(int x, int y)
+    void Click(int x, int y) { Drag(WM_LBUTTONDOWN, WM_LBUTTONUP, MK_LBUTTON, x, x, y); }
+    // Along y, in 10-pixel moves, as a hand would drag.
+    void Drag(UINT down, UINT up, WPARAM button, int fromX, int toX, int y)
     {
-        Mouse(WM_LBUTTONDOWN, MK_LBUTTON, x, y);
-        Mouse(WM_LBUTTONUP, 0, x, y);
+        Mouse(down, button, fromX, y);
+        for (int x = fromX + 10; x <= toX; x += 10)
+            Mouse(WM_MOUSEMOVE, button, x, y);
+        Mouse(up, 0, toX, y);
     }
     std::string StatusText()
     {
@@ -269,10 +273,7 @@ TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
     EXPECT_EQ(viewer.StatusText(), "Nothing here");
     viewer.Click(5, 5);
 
-    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 100, 120);
-    for (int x = 110; x <= 200; x += 10)
-        viewer.Mouse(WM_MOUSEMOVE, MK_LBUTTON, x, 120);
-    viewer.Mouse(WM_LBUTTONUP, 0, 200, 120);
+    viewer.Drag(WM_LBUTTONDOWN, WM_LBUTTONUP, MK_LBUTTON, 100, 200, 120);
     viewer.Key('S');
     Picture after(dir.Path("karvel-snapshot-3.png"));
     ASSERT_EQ(after.rgb.size(), before.rgb.size());
@@ -281,10 +282,7 @@ TEST_F(ViewerBatch, WindowAnswersTheMouseAndKeys)
         changed += after.rgb[i] != before.rgb[i];
     EXPECT_GT(changed, 1000u);  // the box was seen from another side
 
-    viewer.Mouse(WM_RBUTTONDOWN, MK_RBUTTON, 160, 120);  // pan the model out of the middle
-    for (int x = 170; x <= 300; x += 10)
-        viewer.Mouse(WM_MOUSEMOVE, MK_RBUTTON, x, 120);
-    viewer.Mouse(WM_RBUTTONUP, 0, 300, 120);
+    viewer.Drag(WM_RBUTTONDOWN, WM_RBUTTONUP, MK_RBUTTON, 160, 300, 120);  // pan the model out of the middle
     viewer.Key('S');
     Picture panned(dir.Path("karvel-snapshot-4.png"));
     ASSERT_EQ(panned.width, 320);
