@@ -17,41 +17,30 @@ std::vector<int> PixelAt(const _DorBitmap& bitmap, int x, int y)
 }
 }  // namespace
 
-TEST(BmpDecode, BottomUpRowsKeepTheirOrderAndEveryPixel)
+// Bottom-up and top-down row order, padded rows and 32 bits: every pixel lands where
+// BmpFile put it, rows stored bottom-up at their padded stride.
+TEST(BmpDecode, EveryPixelIsReadBottomUpAtItsStride)
 {
-    _DorBitmap bitmap;
-    std::string expected;
-    ASSERT_TRUE(DecodeBmp(BmpFile(4, 8, 24), bitmap, expected)) << expected;
-    EXPECT_EQ(bitmap.type, 0x4D42);
-    EXPECT_EQ(bitmap.info.width, 4);
-    EXPECT_EQ(bitmap.info.height, 8);
-    EXPECT_EQ(bitmap.info.bitCount, 24);
-    EXPECT_EQ(bitmap.bits.GetSize(), 12 * 8);
-    EXPECT_EQ(bitmap.fileSize, 12u * 8u + 54u);
-    for (int y = 0; y < 8; ++y)
-        for (int x = 0; x < 4; ++x)
-            EXPECT_EQ(PixelAt(bitmap, x, y), (std::vector<int>{x, y, 200})) << x << "," << y;
-}
-
-TEST(BmpDecode, TopDownRowsAreTurnedBottomUp)
-{
-    _DorBitmap bitmap;
-    std::string expected;
-    ASSERT_TRUE(DecodeBmp(BmpFile(4, -4, 32), bitmap, expected)) << expected;
-    EXPECT_EQ(bitmap.info.height, 4);
-    EXPECT_EQ(bitmap.info.bitCount, 32);
-    EXPECT_EQ(PixelAt(bitmap, 3, 0), (std::vector<int>{3, 0, 200}));
-    EXPECT_EQ(PixelAt(bitmap, 1, 3), (std::vector<int>{1, 3, 200}));
-    EXPECT_EQ(bitmap.bits[3 * 4 * 4 + 3], 255);  // alpha kept
-}
-
-TEST(BmpDecode, PaddedRowsAreReadAtTheirStride)
-{
-    _DorBitmap bitmap;
-    std::string expected;
-    ASSERT_TRUE(DecodeBmp(BmpFile(3, 2, 24), bitmap, expected)) << expected;
-    EXPECT_EQ(bitmap.bits.GetSize(), 24);  // 9 bytes padded to 12, two rows
-    EXPECT_EQ(PixelAt(bitmap, 2, 1), (std::vector<int>{2, 1, 200}));
+    struct Case {
+        int width, height, bitCount, bytes;
+    } cases[] = {{4, 8, 24, 12 * 8}, {4, -4, 32, 16 * 4}, {3, 2, 24, 12 * 2}};
+    for (const Case& c : cases) {
+        _DorBitmap bitmap;
+        std::string expected;
+        ASSERT_TRUE(DecodeBmp(BmpFile(c.width, c.height, c.bitCount), bitmap, expected)) << expected;
+        int rows = c.height < 0 ? -c.height : c.height;
+        EXPECT_EQ(bitmap.type, 0x4D42);
+        EXPECT_EQ(bitmap.info.width, c.width);
+        EXPECT_EQ(bitmap.info.height, rows);
+        EXPECT_EQ(bitmap.info.bitCount, c.bitCount);
+        EXPECT_EQ(bitmap.bits.GetSize(), c.bytes);
+        EXPECT_EQ(bitmap.fileSize, c.bytes + 54u);
+        if (c.bitCount == 32)
+            EXPECT_EQ(bitmap.bits[c.bytes - 1], 255);  // alpha kept
+        for (int y = 0; y < rows; ++y)
+            for (int x = 0; x < c.width; ++x)
+                EXPECT_EQ(PixelAt(bitmap, x, y), (std::vector<int>{x, y, 200})) << c.height << ": " << x << "," << y;
+    }
 }
 
 TEST(BmpDecode, ThirtyTwoBitsWithPlainBgraMasksAreAccepted)
@@ -72,45 +61,35 @@ TEST(BmpDecode, ThirtyTwoBitsWithPlainBgraMasksAreAccepted)
     EXPECT_NE(expected.find("uncompressed"), std::string::npos);
 }
 
+// Each case changes one header field of a valid 4 x 4 file.
 TEST(BmpDecode, RefusalsSayWhatTheFileShouldHaveBeen)
 {
     struct Case {
         const char* what;
-        std::vector<unsigned char> file;
+        size_t at;
+        uint32_t value;
+        bool wide;
         const char* expected;
-    };
-    std::vector<unsigned char> eightBit = BmpFile(4, 4, 24);
-    PutU16(eightBit, 28, 8);
-    std::vector<unsigned char> runLength = BmpFile(4, 4, 24);
-    PutU32(runLength, 30, 1);
-    std::vector<unsigned char> cutShort = BmpFile(4, 4, 24);
-    cutShort.pop_back();
-    std::vector<unsigned char> notBmp = BmpFile(4, 4, 24);
-    notBmp[0] = 'P';
-    std::vector<unsigned char> zeroWidth = BmpFile(4, 4, 24);
-    PutU32(zeroWidth, 18, 0);
-    std::vector<unsigned char> offsetPastEnd = BmpFile(4, 4, 24);
-    PutU32(offsetPastEnd, 10, 0xFFFFFFF0u);
-    std::vector<unsigned char> hugeHeight = BmpFile(4, 4, 24);
-    PutU32(hugeHeight, 22, 0x80000000u);
-    std::vector<Case> cases = {
-        {"8 bits", eightBit, "24 or 32 bits"},
-        {"run-length", runLength, "uncompressed"},
-        {"cut short", cutShort, "cut short"},
-        {"not BM", notBmp, "starts with \"BM\""},
-        {"zero width", zeroWidth, "positive width"},
-        {"offset past end", offsetPastEnd, "cut short"},
-        {"INT_MIN height", hugeHeight, "non-zero height"},
+    } cases[] = {
+        {"8 bits", 28, 8, false, "24 or 32 bits"},
+        {"run-length", 30, 1, true, "uncompressed"},
+        {"not BM", 0, 'P' | 'M' << 8, false, "starts with \"BM\""},
+        {"zero width", 18, 0, true, "positive width"},
+        {"offset past end", 10, 0xFFFFFFF0u, true, "cut short"},
+        {"INT_MIN height", 22, 0x80000000u, true, "non-zero height"},
     };
     for (const Case& c : cases) {
+        std::vector<unsigned char> file = BmpFile(4, 4, 24);
+        c.wide ? PutU32(file, c.at, c.value) : PutU16(file, c.at, c.value);
         _DorBitmap bitmap;
         std::string expected;
-        EXPECT_FALSE(DecodeBmp(c.file, bitmap, expected)) << c.what;
+        EXPECT_FALSE(DecodeBmp(file, bitmap, expected)) << c.what;
         EXPECT_NE(expected.find(c.expected), std::string::npos) << c.what << ": " << expected;
     }
 }
 
-// Every prefix of a valid file is refused without reading past the bytes given.
+// Every prefix of a valid file is refused without reading past the bytes given, and the
+// one a byte short says so.
 TEST(BmpDecode, EveryTruncationIsRefusedSafely)
 {
     std::vector<unsigned char> file = BmpFile(4, 2, 24);
@@ -120,5 +99,7 @@ TEST(BmpDecode, EveryTruncationIsRefusedSafely)
         std::string expected;
         EXPECT_FALSE(DecodeBmp(prefix, bitmap, expected)) << n;
         EXPECT_FALSE(expected.empty());
+        if (n == file.size() - 1)
+            EXPECT_NE(expected.find("cut short"), std::string::npos) << expected;
     }
 }

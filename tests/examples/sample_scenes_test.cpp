@@ -30,7 +30,7 @@ void ExpectEveryEntityHasGeometry(Scene& scene, const std::string& file)
 }
 }  // namespace
 
-TEST(SampleScenes, HouseHasItsTexturedFloorWallsRoofGridAndAxes)
+TEST(SampleScenes, HouseAndPartLoadAndConvert)
 {
     Scene scene;
     std::string error;
@@ -42,14 +42,10 @@ TEST(SampleScenes, HouseHasItsTexturedFloorWallsRoofGridAndAxes)
         holed += dynamic_cast<CDorHoleExtruded*>(entity->geometry.get()) != nullptr;
     EXPECT_EQ(holed, 4);  // four walls, each with an opening
     ExpectEveryEntityHasGeometry(scene, "house.json");
-}
 
-TEST(SampleScenes, PartLoadsAndConverts)
-{
-    Scene scene;
-    std::string error;
-    ASSERT_TRUE(LoadSceneFile(kSource + "/examples/scenes/part.json", scene, error)) << error;
-    ExpectEveryEntityHasGeometry(scene, "part.json");
+    Scene part;
+    ASSERT_TRUE(LoadSceneFile(kSource + "/examples/scenes/part.json", part, error)) << error;
+    ExpectEveryEntityHasGeometry(part, "part.json");
 }
 
 TEST(SampleScenes, DocumentedExampleLoads)

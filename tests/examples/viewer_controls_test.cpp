@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <vector>
 
 #include "camera/vel_math_camera.h"
 #include "model/dor_math.h"
@@ -11,13 +12,6 @@ namespace {
 // Looking along +y from 20 units away: screen right is +x, screen up is +z.
 _VelCamera LookingNorth() { return Camera(DorVector3(0, -20, 0), DorVector3(0, 0, 0), 90.0, 1.0); }
 }  // namespace
-
-TEST(ViewerControls, ShortMovesAreClicks)
-{
-    EXPECT_TRUE(IsClick(100, 100, 102, 98));
-    EXPECT_FALSE(IsClick(100, 100, 103, 100));
-    EXPECT_FALSE(IsClick(100, 100, 100, 97));
-}
 
 TEST(ViewerControls, DraggingRightTurnsTheModelRightAndDraggingDownShowsItsTop)
 {
@@ -53,22 +47,22 @@ TEST(ViewerControls, PanKeepsThePointUnderTheCursor)
     EXPECT_EQ(none.up, 0.0);
 }
 
-TEST(ViewerControls, WheelFliesATenthOfTheDistancePerNotch)
+// Small conversions of mouse input: click tolerance, wheel notches (a tenth of the distance
+// each, high-resolution wheels sending parts of one) and rubber-band corners top-left first.
+TEST(ViewerControls, ClicksWheelAndRubberBand)
 {
+    EXPECT_TRUE(IsClick(100, 100, 102, 98));
+    EXPECT_FALSE(IsClick(100, 100, 103, 100));
+    EXPECT_FALSE(IsClick(100, 100, 100, 97));
+
     _VelCamera camera = LookingNorth();
     EXPECT_DOUBLE_EQ(FlyForWheel(120, camera), 2.0);
     EXPECT_DOUBLE_EQ(FlyForWheel(-240, camera), -4.0);
-    EXPECT_DOUBLE_EQ(FlyForWheel(60, camera), 1.0);  // high-resolution wheels send parts of a notch
-}
+    EXPECT_DOUBLE_EQ(FlyForWheel(60, camera), 1.0);
 
-TEST(ViewerControls, RubberBandCornersComeTopLeftFirst)
-{
     DorVector2 a, b;
     ZoomCorners(300, 50, 100, 250, a, b);
-    EXPECT_EQ(a.x, 100.0);
-    EXPECT_EQ(a.y, 50.0);
-    EXPECT_EQ(b.x, 300.0);
-    EXPECT_EQ(b.y, 250.0);
+    EXPECT_EQ((std::vector<double>{a.x, a.y, b.x, b.y}), (std::vector<double>{100, 50, 300, 250}));
 }
 
 TEST(ViewerControls, OrbitMovieFramesMakeOneWholeTurn)

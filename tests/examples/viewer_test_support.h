@@ -1,23 +1,16 @@
 #pragma once
 // Files for the viewer's loader tests: BMP images built byte by byte and a scratch folder.
 #include <cstdint>
-#include <cstdio>
 #include <filesystem>
+#include <fstream>
 #include <string>
 #include <vector>
 
 namespace viewer_test {
 
-inline void PutU16(std::vector<unsigned char>& b, size_t at, uint32_t v)
-{
-    b[at] = v & 0xFF;
-    b[at + 1] = (v >> 8) & 0xFF;
-}
-inline void PutU32(std::vector<unsigned char>& b, size_t at, uint32_t v)
-{
-    PutU16(b, at, v & 0xFFFF);
-    PutU16(b, at + 2, v >> 16);
-}
+// Little-endian, as BMP headers store their fields.
+inline void PutU16(std::vector<unsigned char>& b, size_t at, uint32_t v) { b[at] = v & 0xFF, b[at + 1] = (v >> 8) & 0xFF; }
+inline void PutU32(std::vector<unsigned char>& b, size_t at, uint32_t v) { PutU16(b, at, v), PutU16(b, at + 2, v >> 16); }
 
 // A BMP file whose pixel (x, y), counted from the bottom row, has blue x, green y, red 200
 // (and alpha 255 at 32 bits). A negative height stores the rows top-down, as BMP allows.
@@ -26,8 +19,7 @@ inline std::vector<unsigned char> BmpFile(int width, int height, int bitCount)
     int rows = height < 0 ? -height : height;
     int rowBytes = ((width * bitCount + 31) / 32) * 4;
     std::vector<unsigned char> b(54 + static_cast<size_t>(rowBytes) * rows, 0);
-    b[0] = 'B';
-    b[1] = 'M';
+    PutU16(b, 0, 'B' | 'M' << 8);
     PutU32(b, 2, static_cast<uint32_t>(b.size()));
     PutU32(b, 10, 54);
     PutU32(b, 14, 40);
@@ -67,17 +59,10 @@ public:
     std::string Base() const { return (path_ / "").string(); }
     std::string Path(const std::string& file) const { return (path_ / file).string(); }
 
-    void Write(const std::string& file, const std::vector<unsigned char>& bytes) const
+    template <class Bytes>  // a std::string or a std::vector<unsigned char>
+    void Write(const std::string& file, const Bytes& bytes) const
     {
-        std::FILE* f = std::fopen(Path(file).c_str(), "wb");
-        if (f) {
-            std::fwrite(bytes.data(), 1, bytes.size(), f);
-            std::fclose(f);
-        }
-    }
-    void Write(const std::string& file, const std::string& text) const
-    {
-        Write(file, std::vector<unsigned char>(text.begin(), text.end()));
+        std::ofstream(Path(file), std::ios::binary).write(reinterpret_cast<const char*>(bytes.data()), bytes.size());
     }
 
 private:
