@@ -1,7 +1,7 @@
 #pragma once
 // Camera and viewport records. A camera looks from eye to target with the world's +Z as up;
 // fovy is the vertical field of view in degrees; lengths are model units.
-#include "model/dor_types.h"
+#include "../model/dor_types.h"
 
 struct _VelCamera {
     DorVector3 eye;

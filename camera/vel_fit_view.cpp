@@ -1,8 +1,7 @@
-// Fit-all: camera placements that bring a bounding box into view, and the modeller's glide to them.
+// Fit-all: camera placements that bring a bounding box into view.
 #include <cmath>
 
 #include "camera/vel_math_camera.h"
-#include "gl/vel_karvel.h"
 #include "model/dor_math.h"
 
 namespace {
@@ -108,30 +107,4 @@ void CVelMathCamera::FitViewToBox(_VelCamera& camera, const DorVector3& low, con
     double distance = DorLength(camera.target - camera.eye) + shift;
     if (std::isfinite(distance))
         PlaceOnViewLine(camera, forward, sphere, distance);
-}
-
-void CVelKarvel::KarvelAllmodelView(HDC dc, int filter, double duration)
-{
-    _VelCamera from{};
-    GetCamera(from);
-    SetCameraForAllView_Hi(filter);
-    _VelCamera to = from;
-    GetCamera(to);
-    DorVector3 eyeMove = to.eye - from.eye;
-    DorVector3 targetMove = to.target - from.target;
-    if (DorDot(eyeMove, eyeMove) == 0.0 && DorDot(targetMove, targetMove) == 0.0 && to.zFar == from.zFar)
-        return;
-    AnimationCamera(from, to, duration, dc);
-    SetCamera(to);
-    DrawModel(dc);
-}
-
-void CVelKarvel::KarvelAllmodelView_vp(HDC dc, int filter, double duration)
-{
-    ResetViewport();
-    _VelViewport viewport = {0, 0, 0, 0};
-    GetViewport(viewport);
-    if (viewport.width > 0 && viewport.height > 0)
-        SetViewport(viewport);
-    KarvelAllmodelView(dc, filter, duration);
 }

@@ -5,10 +5,10 @@
 // Conventions: angles in degrees, lengths in model units, world up +Z (see dor_types.h for the
 // matrix convention). A move that cannot be made leaves the camera exactly as it was and says
 // nothing; a move whose result would hold a non-finite number is refused the same way.
-#include "camera/vel_camera.h"
-#include "model/dor_types.h"
-#include "model/export.h"
-#include "model/platform.h"
+#include "../camera/vel_camera.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
+#include "../model/platform.h"
 
 class CVelKarvel;
 
@@ -73,4 +73,4 @@ public:
 };
 
 // Whether every field of the camera is a finite number.
-KARVEL_API bool VelCameraIsFinite(const _VelCamera& camera);
+bool VelCameraIsFinite(const _VelCamera& camera);

@@ -8,9 +8,9 @@
 // outline runs counter-clockwise. Outlines are closed implicitly; never repeat the first point.
 #include <initializer_list>
 
-#include "model/dor_list.h"
-#include "model/dor_types.h"
-#include "model/export.h"
+#include "../model/dor_list.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
 
 // The values of CDorGeometry::kind. The converters act on extrusions only.
 enum DorGeometryKind {

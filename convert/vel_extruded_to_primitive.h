@@ -3,9 +3,9 @@
 // and the two profile outlines (wire). Different point counts in the two profiles give nothing.
 // The workers resize the group array to their wall count, reusing what is there; hand them an
 // empty array.
-#include "convert/dor_shape.h"
-#include "convert/vel_group_array.h"
-#include "model/export.h"
+#include "../convert/dor_shape.h"
+#include "../convert/vel_group_array.h"
+#include "../model/export.h"
 
 class KARVEL_API CVelExtrudedToPrimitive {
 public:

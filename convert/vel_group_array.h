@@ -1,5 +1,5 @@
 #pragma once
 // The array into which every converter appends its groups.
-#include "model/vel_primitive.h"
+#include "../model/vel_primitive.h"
 
 typedef CDorArray<CVelTrianglePolys, CVelTrianglePolys&> CVelGroupArray;

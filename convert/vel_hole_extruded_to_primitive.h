@@ -3,9 +3,9 @@
 // counts in the two profiles give nothing. Holes are paired by index, bottom hole h with top
 // hole h; a pair whose counts differ, or that is empty, gets no walls. The workers resize the
 // group array to their outline wall count, reusing what is there; hand them an empty array.
-#include "convert/dor_shape.h"
-#include "convert/vel_group_array.h"
-#include "model/export.h"
+#include "../convert/dor_shape.h"
+#include "../convert/vel_group_array.h"
+#include "../model/export.h"
 
 class KARVEL_API CVelHoleExtrudedToPrimitive {
 public:

@@ -5,9 +5,9 @@
 //
 // All loops share one vertex list: the outline first, then each hole in stored order. Holes are
 // expected inside the outline and in its plane; nothing checks this.
-#include "convert/dor_shape.h"
-#include "convert/vel_group_array.h"
-#include "model/export.h"
+#include "../convert/dor_shape.h"
+#include "../convert/vel_group_array.h"
+#include "../model/export.h"
 
 class KARVEL_API CVelHolePolygonToPrimitive {
 public:

@@ -2,9 +2,9 @@
 // Converts one polygon into groups: an indexed triangle group (solid) or an outline (wire).
 // In practice these are the caps of extrusions. `reverse` 1 means the polygon is seen from its
 // back (a bottom cap); any other value counts as 0.
-#include "convert/dor_shape.h"
-#include "convert/vel_group_array.h"
-#include "model/export.h"
+#include "../convert/dor_shape.h"
+#include "../convert/vel_group_array.h"
+#include "../model/export.h"
 
 class KARVEL_API CVelPolygonToPrimitive {
 public:

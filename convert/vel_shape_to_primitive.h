@@ -2,10 +2,10 @@
 // Turns a whole shape into one primitive: each geometry in list order is converted by the
 // converter for its kind, and its groups are appended. Only extrusions (kinds 7 and 8) produce
 // groups; bare polygons, null entries, unknown kinds and styles are skipped silently.
-#include "convert/dor_shape.h"
-#include "convert/vel_group_array.h"
-#include "model/export.h"
-#include "model/vel_primitive.h"
+#include "../convert/dor_shape.h"
+#include "../convert/vel_group_array.h"
+#include "../model/export.h"
+#include "../model/vel_primitive.h"
 
 class KARVEL_API CVelShapeToPrimitive {
 public:

@@ -1,11 +1,10 @@
 #pragma once
 // CVelGLContext: the OpenGL rendering context of a modeller on one device context, and the
 // background colour its frames are cleared to.
-#include "model/dor_types.h"
-#include "model/export.h"
-#include "model/platform.h"
+#include "../model/dor_types.h"
+#include "../model/platform.h"
 
-class KARVEL_API CVelGLContext {
+class CVelGLContext {
 public:
     DorColorValue background;  // opaque black unless the host sets it
     HGLRC handle;              // null when there is no context

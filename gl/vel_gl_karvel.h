@@ -9,10 +9,10 @@
 //
 // The store operations are in vel_gl_karvel.cpp, context lifecycle in wgl_karvel.cpp, the frame
 // in gl_draw.cpp.
-#include "gl/vel_gl_context.h"
-#include "gl/vel_gl_render_state.h"
-#include "gl/vel_gl_store.h"
-#include "gl/vel_karvel.h"
+#include "../gl/vel_gl_context.h"
+#include "../gl/vel_gl_render_state.h"
+#include "../gl/vel_gl_store.h"
+#include "../gl/vel_karvel.h"
 
 class KARVEL_API CVelGLKarvel : public CVelKarvel {
 public:

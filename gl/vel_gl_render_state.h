@@ -6,9 +6,8 @@
 //
 // The portable members are defined in vel_gl_render_state.cpp; the ones that issue OpenGL calls
 // (marked "GL") in gl_render_state.cpp and need the context current.
-#include "camera/vel_camera.h"
-#include "model/dor_types.h"
-#include "model/export.h"
+#include "../camera/vel_camera.h"
+#include "../model/dor_types.h"
 
 class CVelGLStructure;
 
@@ -26,7 +25,7 @@ struct _VelGLLight {
 
 const int VelLightCount = 8;
 
-class KARVEL_API CVelGLRenderState {
+class CVelGLRenderState {
 public:
     CVelGLStructure* model;
     _VelCamera camera;
@@ -67,4 +66,4 @@ public:
 };
 
 // The up vector that stands at right angles to the view direction d, tilted from +Z.
-KARVEL_API DorVector3 VelCameraUp(const DorVector3& d);
+DorVector3 VelCameraUp(const DorVector3& d);

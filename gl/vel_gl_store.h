@@ -5,10 +5,9 @@
 //
 // Flags of ChangePrimitive/GetPrimitive (VelChange*) select the parts of a primitive that are
 // written or read back; groups are matched by index.
-#include "model/dor_list.h"
-#include "model/dor_types.h"
-#include "model/export.h"
-#include "model/vel_primitive.h"
+#include "../model/dor_list.h"
+#include "../model/dor_types.h"
+#include "../model/vel_primitive.h"
 
 class CVelGLRenderState;
 
@@ -36,7 +35,7 @@ enum VelChangeFlag {
 
 // What an operation converting primitives works in: the vertex scale applied on the way in
 // (always 1.0) and the render state it belongs to. It makes no context current.
-class KARVEL_API CVelGLScope {
+class CVelGLScope {
 public:
     double vertexScale;
     CVelGLRenderState* renderState;
@@ -46,7 +45,7 @@ public:
 };
 
 // The OpenGL copy of one CVelTrianglePolys. The float arrays always hold vertexCount vertices.
-class KARVEL_API CVelGLTrianglePolygons {
+class CVelGLTrianglePolygons {
 public:
     CDorArray<float, float> positions;  // x, y, z per vertex
     CDorArray<float, float> normals;    // x, y, z per vertex
@@ -87,7 +86,7 @@ private:
     void WriteGeometry(const CVelTrianglePolys& group, int count, double scale);
 };
 
-class KARVEL_API CVelGLEntity {
+class CVelGLEntity {
 public:
     CDorArray<CVelGLTrianglePolygons, CVelGLTrianglePolygons&> groups;
     long DrawMode;  // bit 0 hidden, bit 1 pickable
@@ -100,7 +99,7 @@ public:
     void Convert(const CVelPrimitive& primitive, double scale);
 };
 
-class KARVEL_API CVelGLStructure {
+class CVelGLStructure {
 public:
     CDorList entities;  // of CVelGLEntity*, owned
     CDorArray<_DorBitmap, _DorBitmap&> textures;  // texture name i + 1 is element i
@@ -149,9 +148,9 @@ const unsigned int VelChangeTextureLimit = 0x10000;
 // Whether bitmap can become a texture: 1, 24 or 32 bits per pixel, a pixel count (width x height
 // as an unsigned product) that is a power of two from 2 to maxPixels, and pixel rows that are
 // all present in bits.
-KARVEL_API bool VelTextureAcceptable(const _DorBitmap& bitmap, unsigned int maxPixels);
+bool VelTextureAcceptable(const _DorBitmap& bitmap, unsigned int maxPixels);
 // Whether bits holds every pixel row that the header of bitmap describes.
-KARVEL_API bool VelTexturePixelsPresent(const _DorBitmap& bitmap);
+bool VelTexturePixelsPresent(const _DorBitmap& bitmap);
 
 // Whether every one of count indices names one of vertexCount vertices.
-KARVEL_API bool VelIndicesInRange(const unsigned int* indices, int count, int vertexCount);
+bool VelIndicesInRange(const unsigned int* indices, int count, int vertexCount);

@@ -3,11 +3,11 @@
 // virtual operations is part of the binary interface: never reorder or insert.
 // Every operation runs on the thread that initialised the modeller (OpenGL contexts are bound to
 // a thread); the library takes no locks.
-#include "camera/vel_camera.h"
-#include "model/dor_types.h"
-#include "model/export.h"
-#include "model/platform.h"
-#include "model/vel_primitive.h"
+#include "../camera/vel_camera.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
+#include "../model/platform.h"
+#include "../model/vel_primitive.h"
 
 class CDorShape;
 

@@ -3,8 +3,8 @@
 // entity handles (_DorPosition*). Nodes come from blocks of blockSize nodes; a removed node goes
 // to the front of a free chain and is reused first, so handles of other elements never move.
 // When the last element is removed every block is freed.
-#include "model/dor_types.h"
-#include "model/export.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
 
 class KARVEL_API CDorList {
 public:

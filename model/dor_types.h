@@ -8,7 +8,7 @@
 //   row 3, and A * B applies A first (the memory order of an OpenGL matrix);
 // - the world's up axis is +Z;
 // - lengths below 0.0001 count as zero; 1e-6 is the snapping and collinearity tolerance.
-#include "model/dor_array.h"
+#include "../model/dor_array.h"
 
 #include <cstdint>
 

@@ -2,8 +2,8 @@
 // Render primitive records: what every shape becomes before it is drawn. A primitive is a list
 // of groups; a group is one material and one run of points, lines or triangles in double
 // precision. Copies are deep.
-#include "model/dor_types.h"
-#include "model/export.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
 
 struct _VelVertex {
     DorVector3 position;
@@ -34,7 +34,7 @@ enum VelRenderKind { VelRenderLit = 0, VelRenderVertexColour = 1, VelRenderTextu
 
 // The number of elements drawn for a group; false for a type outside 0..6, which leaves the
 // drawn count undefined. Counts at or below zero draw nothing.
-KARVEL_API bool VelDrawnElementCount(int groupType, int vertexCount, int triangleCount, int& count);
+bool VelDrawnElementCount(int groupType, int vertexCount, int triangleCount, int& count);
 
 class KARVEL_API CVelTrianglePolys {
 public:

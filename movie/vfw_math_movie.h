@@ -9,8 +9,8 @@
 #include <windows.h>
 #include <vfw.h>
 
-#include "model/dor_types.h"
-#include "model/export.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
 
 class KARVEL_API CVelMathMovie {
 public:

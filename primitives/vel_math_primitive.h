@@ -1,9 +1,9 @@
 #pragma once
 // Ready-made line primitives: a single segment and a grid in the z = 0 plane, each appended as
 // one group of separate segments (group type 1) to a primitive the caller owns.
-#include "model/dor_types.h"
-#include "model/export.h"
-#include "model/vel_primitive.h"
+#include "../model/dor_types.h"
+#include "../model/export.h"
+#include "../model/vel_primitive.h"
 
 class KARVEL_API CVelMathPrimitive {
 public:

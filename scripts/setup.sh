@@ -16,7 +16,8 @@ karvel_require_packages() {
   "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq "${missing[@]}" >/dev/null
 }
 
-KARVEL_BUILD_PACKAGES=(cmake make g++ mingw-w64 wine wine64 xvfb xauth libosmesa6 googletest
+KARVEL_BUILD_PACKAGES=(cmake make g++ binutils mingw-w64 binutils-mingw-w64-x86-64 binutils-mingw-w64-i686
+                       wine wine64 xvfb xauth libosmesa6 googletest
                        libbenchmark-dev nlohmann-json3-dev libstb-dev)
 
 # Creates the throwaway Wine prefix of a build tree once, so that tests do not race to make it.

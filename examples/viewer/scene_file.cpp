@@ -6,10 +6,10 @@
 #include <nlohmann/json.hpp>
 
 #include "bmp_file.h"
-#include "gl/vel_gl_store.h"
 #include "model/dor_math.h"
 #include "primitives/vel_math_primitive.h"
 #include "scene.h"
+#include "viewer_math.h"
 
 using Json = nlohmann::json;
 
@@ -168,7 +168,7 @@ DorVector2 ReadPoint2(const Json& value, const std::string& place)
 DorVector3 ReadDirection(const Json& value, const std::string& place)
 {
     DorVector3 direction = ReadPoint(value, place);
-    if (DorLength(direction) < 0.0001)
+    if (Length(direction) < 0.0001)
         FailFound(place, "a direction [x, y, z] at least 0.0001 long", value);
     return direction;
 }
@@ -249,9 +249,26 @@ std::vector<DorVector3> ReadProfile(const Json& value, const std::string& place)
     return points;
 }
 
+// Points toward a viewer who sees the loop run counter-clockwise.
 DorVector3 NewellNormal(const std::vector<DorVector3>& loop)
 {
-    return DorNewellNormal(loop.data(), static_cast<int>(loop.size()));
+    DorVector3 n;
+    for (size_t i = 0; i < loop.size(); ++i) {
+        const DorVector3& a = loop[i];
+        const DorVector3& b = loop[(i + 1) % loop.size()];
+        n.x += (a.y - b.y) * (a.z + b.z);
+        n.y += (a.z - b.z) * (a.x + b.x);
+        n.z += (a.x - b.x) * (a.y + b.y);
+    }
+    return n;
+}
+
+// AddTexture's rule for the bitmaps DecodeBmp gives (24 or 32 bits, every row present): width x
+// height a power of two from 2 to 512 x 512. Checked here so that a scene fails as it loads.
+bool TextureSizeAccepted(const _DorBitmap& bitmap)
+{
+    unsigned int pixels = static_cast<unsigned int>(bitmap.info.width) * static_cast<unsigned int>(bitmap.info.height);
+    return pixels >= 2 && pixels <= 512u * 512u && (pixels & (pixels - 1)) == 0;
 }
 
 // Point 0 stays, the others reverse: the converters' own reordering, which keeps the pairing
@@ -345,7 +362,7 @@ private:
         _VelCamera& camera = scene_.camera;
         camera.eye = ReadPoint(Require(value, "eye", place, "a point [x, y, z]"), Member(place, "eye"));
         camera.target = ReadPoint(Require(value, "target", place, "a point [x, y, z]"), Member(place, "target"));
-        if (DorLength(camera.target - camera.eye) < 0.0001)
+        if (Length(camera.target - camera.eye) < 0.0001)
             Fail(Member(place, "target"), "a point at least 0.0001 away from the eye");
         camera.fovy = 45.0;
         camera.zNear = 0.1;
@@ -544,7 +561,7 @@ private:
         std::string expected;
         if (!DecodeBmp(bytes, texture->bitmap, expected))
             Fail(place, expected + " (\"" + path + "\")");
-        if (!VelTextureAcceptable(texture->bitmap, VelAddTextureLimit))
+        if (!TextureSizeAccepted(texture->bitmap))
             Fail(place, "a texture whose width x height is a power of two up to 512 x 512 (\"" + path + "\" is " +
                             std::to_string(texture->bitmap.info.width) + " x " + std::to_string(texture->bitmap.info.height) + ")");
         int index = static_cast<int>(scene_.textures.size());

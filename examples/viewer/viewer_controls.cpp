@@ -5,6 +5,7 @@
 #include <cstdlib>
 
 #include "model/dor_math.h"
+#include "viewer_math.h"
 
 namespace {
 const double OrbitDegreesPerPixel = 0.4;
@@ -42,7 +43,7 @@ PanStep PanForDrag(int dx, int dy, const _VelCamera& camera, int viewHeight)
 {
     if (viewHeight <= 0)
         return {0.0, 0.0};
-    double distance = DorLength(camera.target - camera.eye);
+    double distance = Length(camera.target - camera.eye);
     double unitsPerPixel = 2.0 * distance * std::tan(camera.fovy * DorPi / 360.0) / viewHeight;
     // The scene follows the cursor, so the camera moves against it (window y grows downward).
     return {-dx * unitsPerPixel, dy * unitsPerPixel};
@@ -50,7 +51,7 @@ PanStep PanForDrag(int dx, int dy, const _VelCamera& camera, int viewHeight)
 
 double FlyForWheel(int wheelDelta, const _VelCamera& camera)
 {
-    return wheelDelta / WheelNotch * WheelFlyFraction * DorLength(camera.target - camera.eye);
+    return wheelDelta / WheelNotch * WheelFlyFraction * Length(camera.target - camera.eye);
 }
 
 void ZoomCorners(int x0, int y0, int x1, int y1, DorVector2& topLeft, DorVector2& bottomRight)
@@ -70,6 +71,11 @@ _DorMaterial HighlightMaterial(const _DorMaterial& material)
     lit.specular = DorColorValue(1.0f, 1.0f, 0.8f, 1.0f);
     lit.shininess = 60.0f;
     return lit;
+}
+
+bool ProgressLineDue(int done, int total)
+{
+    return total > 0 && done * 10LL / total != (done - 1) * 10LL / total;
 }
 
 std::vector<std::string> DescribePick(int x, int y, const std::vector<PickedEntity>& hits, const DorVector3& point)

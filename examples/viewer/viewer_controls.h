@@ -36,6 +36,10 @@ void ZoomCorners(int x0, int y0, int x1, int y1, DorVector2& topLeft, DorVector2
 // The azimuth step of an orbit movie of frames frames: one full turn.
 double OrbitFrameAzimuth(int frames);
 
+// Whether recording frame `done` of total completes another tenth of the movie: when the
+// progress goes to a log rather than a terminal, only those frames get a line.
+bool ProgressLineDue(int done, int total);
+
 // A bright, warm version of a material for the picked entity; alpha is kept so a transparent
 // entity stays transparent.
 _DorMaterial HighlightMaterial(const _DorMaterial& material);

@@ -1,9 +1,12 @@
 // Batch use: a hidden window of the requested size holds the context; pictures come from
 // ToBitmap at that size.
+#include <io.h>
+
 #include <cstdio>
 
 #include "movie/vfw_math_movie.h"
 #include "png_file.h"
+#include "viewer_controls.h"
 #include "win32_model_view.h"
 #include "win32_viewer.h"
 
@@ -40,6 +43,7 @@ int PrintPick(ModelView& view, const ViewerOptions& options)
 int RecordOrbit(ModelView& view, const ViewerOptions& options)
 {
     CVelMathMovie_NoComp recorder;
+    const bool terminal = _isatty(_fileno(stdout)) != 0;
     for (int frame = 0; frame < options.frames; ++frame) {
         if (frame > 0)
             view.modeller.RoundDolly(0.0, OrbitFrameAzimuth(options.frames));
@@ -50,12 +54,16 @@ int RecordOrbit(ModelView& view, const ViewerOptions& options)
             return Fail("cannot start recording " + options.movie);
         if (!recorder.Add(bitmap))
             return Fail("cannot record frame " + std::to_string(frame + 1) + " into " + options.movie);
-        std::printf("\rmovie %s: frame %d/%d", options.movie.c_str(), frame + 1, options.frames);
+        // On a terminal the line updates in place; a log gets a line per tenth.
+        if (terminal)
+            std::printf("\rmovie %s: frame %d/%d", options.movie.c_str(), frame + 1, options.frames);
+        else if (ProgressLineDue(frame + 1, options.frames))
+            std::printf("movie %s: frame %d/%d\n", options.movie.c_str(), frame + 1, options.frames);
         std::fflush(stdout);
     }
     recorder.End();
-    std::printf("\nmovie %s (%d frames at %d fps, %dx%d)\n", options.movie.c_str(), options.frames, options.fps,
-                options.width, options.height);
+    std::printf("%smovie %s (%d frames at %d fps, %dx%d)\n", terminal ? "\n" : "", options.movie.c_str(), options.frames,
+                options.fps, options.width, options.height);
     return 0;
 }
 

@@ -1,9 +1,9 @@
-// The timed orbit: frames drawn on the window while its thread's messages keep flowing.
+// The timed orbit: frames drawn on the window while its thread's messages keep flowing. The static
+// lives with the modeller because it drives one; the orbit itself is camera maths.
 #include <windows.h>
 #include <mmsystem.h>
 
-#include <cmath>
-
+#include "camera/vel_camera_motion.h"
 #include "camera/vel_math_camera.h"
 #include "gl/vel_karvel.h"
 
@@ -24,15 +24,6 @@ bool PumpMessages()
     }
     return true;
 }
-
-// The start camera turned about its target by the angle reached after elapsed milliseconds.
-_VelCamera OrbitAt(const _VelCamera& start, int degreesPerSecond, DWORD elapsed)
-{
-    _VelCamera camera = start;
-    double degrees = std::fmod(degreesPerSecond * (elapsed / 1000.0), 360.0);
-    CVelMathCamera::RoundDolly(camera, 0.0, degrees);
-    return camera;
-}
 }  // namespace
 
 void CVelMathCamera::RoundAnimationStart(CVelKarvel* modeler, int& running, HWND window, int degreesPerSecond)
@@ -44,7 +35,7 @@ void CVelMathCamera::RoundAnimationStart(CVelKarvel* modeler, int& running, HWND
     const DWORD begin = timeGetTime();
     while (running && IsWindow(window)) {
         const DWORD frameStart = timeGetTime();
-        modeler->SetCamera(OrbitAt(start, degreesPerSecond, frameStart - begin));
+        modeler->SetCamera(VelOrbitCamera(start, degreesPerSecond, frameStart - begin));
         HDC dc = GetDC(window);
         modeler->DrawModel(dc);
         ReleaseDC(window, dc);

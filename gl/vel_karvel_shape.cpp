@@ -1,6 +1,7 @@
 // The modeller's shape entry points: conversion followed by the entity store's own operations.
-#include "convert/vel_shape_to_primitive.h"
 #include "gl/vel_karvel.h"
+
+#include "convert/vel_shape_to_primitive.h"
 
 _DorPosition* CVelKarvel::AddShape(CDorShape& shape)
 {
