@@ -20,7 +20,7 @@
 /// model: add entities after it, textures before it.
 ///
 /// The data members are public for the library's own layout and tests; hosts use the
-/// operations.
+/// operations (the classes of the members are not exported from the DLL).
 class KARVEL_API CVelGLKarvel : public CVelKarvel {
 public:
     CVelGLStructure model;  ///< The entities, the texture list and the offset; owned.

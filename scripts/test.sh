@@ -16,6 +16,9 @@ echo "== 32-bit DLL imports"
 scripts/check-imports.sh i686-w64-mingw32-objdump build/mingw32/bin/karvel.dll
 
 status=0
+echo "== reference: every public class and operation documented"
+scripts/docs.sh --check || status=1
+
 echo "== native tests"
 ctest --preset native || status=1
 
