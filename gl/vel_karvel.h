@@ -61,11 +61,11 @@ public:
     /// Nothing to free in the interface.
     /* 0 */ virtual ~CVelKarvel();
     /// Initialize(HDC&) with viewport (window pixels, OpenGL's bottom-up y) applied instead of the
-    /// one the new context starts with.
+    /// one the new context starts with; it also becomes the viewport ResetViewport returns to.
     /* 1 */ virtual int Initialize(HDC& dc, _VelViewport viewport) = 0;
     /// Makes the modeller render into dc: chooses and sets a double-buffered RGBA pixel format (24
     /// colour and 24 depth bits), creates the OpenGL context, makes it current on this thread and
-    /// sets up the fixed state. Textures are uploaded again and the camera's aspect follows the
+    /// sets up the fixed state. The texture list is uploaded and the camera's aspect follows the
     /// viewport. Give the window its own DC (CS_OWNDC) and keep it: the modeller keeps rendering
     /// into it.
     ///
