@@ -179,13 +179,14 @@ public:
     /// Rubber-band zoom: enlarges and shifts the viewport so that the rectangle from corner0
     /// (top-left) to corner1 (bottom-right), in window pixels with y down, fills the window; the
     /// camera does not move. Returns 1, or 0 with nothing changed (a rectangle without width or
-    /// height, or more than 5 times magnification). ResetViewport undoes every zoom. Does not
-    /// redraw. Same for every modeller.
+    /// height, or more than 5 times magnification). ResetViewport followed by SetViewport undoes
+    /// every zoom. Does not redraw. Same for every modeller.
     /* 30 */ virtual int ViewportZoom(DorVector2 corner0, DorVector2 corner1);
     /// Click-to-approach at point (window pixels, y down). With useDepth non-zero and a pickable
-    /// entity under point, the eye moves toward it so that things at its depth grow by viewport
-    /// height / height (pixels); the target stays. Otherwise the view turns toward half the pointed
-    /// offset from the centre, the eye staying. Does not redraw. Same for every modeller.
+    /// entity under point, the eye moves forward along the view so that things at the picked depth
+    /// grow by viewport height / height (pixels); the target stays. Otherwise the view turns toward
+    /// half the pointed offset from the centre, the eye staying. Does not redraw. Same for every
+    /// modeller.
     /* 31 */ virtual void ApproachCamera(DorVector2 point, double height, int useDepth);
     /// Copies the viewport in force into viewport; untouched without a context. Base: nothing.
     /* 32 */ virtual void GetViewport(_VelViewport& viewport);
