@@ -4,28 +4,28 @@
 ///
 /// Conventions of every modeller operation:
 /// - Thread: every call comes on the thread that called Initialize (or SetCurrent) last, while
-///   the modeller's context is current there; nothing but Initialize, SetCurrent and ToBitmap
-///   makes a context current. OpenGL contexts are bound to a thread and the library takes no
-///   locks. With two modellers on one thread, switch between them with SetCurrent; an operation
-///   on a modeller whose context is not current draws into whichever context is.
+/// the modeller's context is current there; nothing but Initialize, SetCurrent and ToBitmap
+/// makes a context current. OpenGL contexts are bound to a thread and the library takes no
+/// locks. With two modellers on one thread, switch between them with SetCurrent; an operation
+/// on a modeller whose context is not current draws into whichever context is.
 /// - Units: model units (double) for geometry, cameras, lights and offsets; degrees for angles;
-///   window pixels with y counted from the top for cursor positions (x, y and DorVector2 points).
+/// window pixels with y counted from the top for cursor positions (x, y and DorVector2 points).
 /// - Failure: an int result (1 success, 0 failure) where there is one, otherwise the call
-///   silently does nothing; a refused camera move leaves the camera untouched. The library
-///   throws no exceptions of its own (allocation failure aside) and writes no log.
+/// silently does nothing; a refused camera move leaves the camera untouched. The library
+/// throws no exceptions of its own (allocation failure aside) and writes no log.
 /// - Ownership: the host owns everything it passes in (shapes, primitives, bitmaps, records) and
-///   keeps it after the call; the modeller copies what it keeps. Pointers the modeller returns
-///   (GetFreeProperty, GetTextureList) point into its own storage: valid until the entity or the
-///   texture list goes, never freed by the host.
+/// keeps it after the call; the modeller copies what it keeps. Pointers the modeller returns
+/// (GetFreeProperty, GetTextureList) point into its own storage: valid until the entity or the
+/// texture list goes, never freed by the host.
 /// - Handles: entities are addressed by the _DorPosition* returned by AddPrimitive/AddShape; a
-///   null handle, or one whose node holds no entity, makes an operation do nothing. A removed
-///   entity's handle must not be used again.
+/// null handle, or one whose node holds no entity, makes an operation do nothing. A removed
+/// entity's handle must not be used again.
 /// - Drawing: nothing redraws by itself except DrawModel and the glides (AnimationCamera,
-///   KarvelAllmodelView, KarvelAllmodelView_vp); after a change, the host calls DrawModel.
+/// KarvelAllmodelView, KarvelAllmodelView_vp); after a change, the host calls DrawModel.
 /// - Operations that need a live modeller (camera, lights, viewport, cull mode, drawing,
-///   picking, capture) do nothing before the first Initialize and after Finalize; getters then
-///   leave their output untouched. The entity store, the texture list, the background colour and
-///   the offset work at any time.
+/// picking, capture) do nothing before the first Initialize and after Finalize; getters then
+/// leave their output untouched. The entity store, the texture list, the background colour and
+/// the offset work at any time.
 ///
 /// The order of the virtual operations is part of the binary interface: never reorder or insert.
 /// The descriptions below are those of the OpenGL modeller, CVelGLKarvel, the one
@@ -105,11 +105,10 @@ public:
     /// Writes into centre (x, y, z; model units) the centre of the axis-aligned box of the stored
     /// vertex positions; (0, 0, 0) for an empty box. Entities whose DrawMode has value 1 (hidden)
     /// or 4 set are left out; filter leaves out groups: 1 points, 2 separate lines (line strips
-    /// still count), 4 every group, 8 transparent groups (diffuse alpha below 1). Needs no context.
-    /// Base: nothing.
+    /// still count), 4 every group, 8 transparent groups (diffuse alpha below 1). Base: nothing.
     /* 11 */ virtual void GetCenterPoint(DorVector3& centre, int filter);
     /// The model offset (model units): the whole scene is drawn, picked and un-projected translated
-    /// by -offset. Needs no context. Base: nothing.
+    /// by -offset. Base: nothing.
     /* 12 */ virtual void SetOffset(DorVector3& offset);
     /// Fills hits with the pickable entities (DrawMode value 2 set; hidden ones count too) under a
     /// 5 x 5 pixel square around x, y (window pixels, y from the top), nearest first. hits is sized
@@ -131,8 +130,7 @@ public:
     /// Hook called at the start of every context start-up and capture, for a derived modeller to
     /// adjust the device; does nothing here. Base: nothing.
     /* 16 */ virtual void DeviceSetting();
-    /// Copies the background colour (default opaque black) into colour. Needs no context. Base:
-    /// nothing.
+    /// Copies the background colour (default opaque black) into colour. Base: nothing.
     /* 17 */ virtual void GetBkColor(DorColorValue& colour);
     /// Sets the background colour; frames clear to its red, green and blue (alpha ignored). Needs
     /// no context. Base: nothing.
@@ -151,44 +149,39 @@ public:
     /* 20 */ virtual void SetCullMode(int mode);
     /// The cull mode; 0 without a context. Base: 1.
     /* 21 */ virtual int GetCullMode();
-    /// Copies the modeller's camera into camera (model units); untouched without a context. Base:
-    /// nothing.
+    /// Copies the modeller's camera into camera. Base: nothing.
     /* 22 */ virtual void GetCamera(_VelCamera& camera);
     /// Stores camera; ignored whole when its eye and target are closer than 0.0001. Issues no
-    /// OpenGL call and does not redraw. Base: nothing.
+    /// OpenGL call. Base: nothing.
     /* 23 */ virtual void SetCamera(const _VelCamera& camera);
     /// Fit-all: keeps the direction of view and places the camera so that the box of what
     /// GetCenterPoint(filter) counts fills the view, its bounding sphere touching the narrower
-    /// field of view. An empty model leaves the camera alone. Does not redraw. Base: nothing.
+    /// field of view. An empty model leaves the camera alone. Base: nothing.
     /* 24 */ virtual void SetCameraForAllView_Low(int filter);
     /// Fit-all as SetCameraForAllView_Low, tighter: the box's projected corners touch the edge of
     /// the view. Base: nothing.
     /* 25 */ virtual void SetCameraForAllView_Hi(int filter);
-    /// CVelMathCamera::PanTilt (degrees) on the modeller's camera. Does not redraw. Same for every
-    /// modeller.
+    /// CVelMathCamera::PanTilt on the modeller's camera. Same for every modeller.
     /* 26 */ virtual void PanTilt(double pan, double tilt);
-    /// CVelMathCamera::Dolly (model units) on the modeller's camera. Does not redraw. Same for
-    /// every modeller.
+    /// CVelMathCamera::Dolly on the modeller's camera. Same for every modeller.
     /* 27 */ virtual void Dolly(double forward, double left, double up, int eyeOnly);
-    /// CVelMathCamera::Fly (model units) on the modeller's camera. Does not redraw. Same for every
-    /// modeller.
+    /// CVelMathCamera::Fly on the modeller's camera. Same for every modeller.
     /* 28 */ virtual void Fly(double forward, double right, double up, int eyeOnly);
-    /// CVelMathCamera::RoundDolly (degrees: elevation first) on the modeller's camera. Does not
-    /// redraw. Same for every modeller.
+    /// CVelMathCamera::RoundDolly (degrees: elevation first) on the modeller's camera. Same for
+    /// every modeller.
     /* 29 */ virtual void RoundDolly(double elevation, double azimuth);
     /// Rubber-band zoom: enlarges and shifts the viewport so that the rectangle from corner0
     /// (top-left) to corner1 (bottom-right), in window pixels with y down, fills the window; the
     /// camera does not move. Returns 1, or 0 with nothing changed (a rectangle without width or
     /// height, or more than 5 times magnification). ResetViewport followed by SetViewport undoes
-    /// every zoom. Does not redraw. Same for every modeller.
+    /// every zoom. Same for every modeller.
     /* 30 */ virtual int ViewportZoom(DorVector2 corner0, DorVector2 corner1);
     /// Click-to-approach at point (window pixels, y down). With useDepth non-zero and a pickable
     /// entity under point, the eye moves forward along the view so that things at the picked depth
     /// grow by viewport height / height (pixels); the target stays. Otherwise the view turns toward
-    /// half the pointed offset from the centre, the eye staying. Does not redraw. Same for every
-    /// modeller.
+    /// half the pointed offset from the centre, the eye staying. Same for every modeller.
     /* 31 */ virtual void ApproachCamera(DorVector2 point, double height, int useDepth);
-    /// Copies the viewport in force into viewport; untouched without a context. Base: nothing.
+    /// Copies the viewport in force into viewport. Base: nothing.
     /* 32 */ virtual void GetViewport(_VelViewport& viewport);
     /// Applies viewport (window pixels, OpenGL's bottom-up y) at once and sets the camera's aspect
     /// to its width / height. Base: nothing.
@@ -199,15 +192,15 @@ public:
     /// does). Base: nothing.
     /* 34 */ virtual void ResetViewport();
     /// Copies light index (0..7) into light: position in model units, direction as the unit vector
-    /// it shines along. Other indices, or no context, leave light untouched. Base: nothing.
+    /// it shines along. Other indices leave light untouched. Base: nothing.
     /* 35 */ virtual void GetLight(int index, DorLight& light);
-    /// Sets light index (0..7); other indices, or no context, do nothing. The direction is
-    /// normalised; it takes effect at the next frame. Light 0 (on by default) follows the camera:
-    /// every frame puts it at the eye shining along the view, so only its colours, kind, switch and
-    /// attenuation can be set. Base: nothing.
+    /// Sets light index (0..7); other indices do nothing. The direction is normalised; it takes
+    /// effect at the next frame. Light 0 (on by default) follows the camera: every frame puts it at
+    /// the eye shining along the view, so only its colours, kind, switch and attenuation can be
+    /// set. Base: nothing.
     /* 36 */ virtual void SetLight(int index, DorLight light);
     /// Copies primitive into a new entity at the end of the drawing order and returns its handle.
-    /// The host keeps (and destroys) its own primitive. Needs no context. Base: null.
+    /// The host keeps (and destroys) its own primitive. Base: null.
     /* 37 */ virtual _DorPosition* AddPrimitive(CVelPrimitive& primitive);
     /// Updates the entity at position from primitive, the parts that flags select (VelChangeFlag;
     /// 31 = all): 1 geometry, 2 material and render kind, 4 group type, indices and line width, 8
