@@ -25,7 +25,7 @@ public:
 
     /// World to view: the eye at the origin looking down -Z with world +Z toward screen-up, then
     /// everything shifted by dist along +Z (a point dist in front of the eye lands on z = 0).
-    /// Overwrites out. A camera whose eye and target coincide gives an unspecified matrix.
+    /// Overwrites out. A camera whose eye and target coincide gives no meaningful matrix.
     static void GetToViewMatrix(const _VelCamera& camera, double dist, DorMatrix4x4& out);
     /// The view matrix followed by a projection that maps the upper edge of the field of view to
     /// y = 1 after division by w; no aspect ratio enters it. dist 0 gives NaN in the depth terms.
