@@ -42,7 +42,8 @@ public:
     int kind;  ///< DorGeometryKind.
     _DorMaterial material;  ///< Copied into every group made from this geometry.
     int style;  ///< DorGeometryStyle.
-    double textureScaleU;  ///< Model units per texture repeat along U; never tested for 0 (0 gives infinite coordinates).
+    /// Model units per texture repeat along U; never tested for 0 (0 gives infinite coordinates).
+    double textureScaleU;
     double textureScaleV;  ///< The same along V.
     unsigned int texture;  ///< Name from CVelKarvel::AddTexture; 0 = untextured. Non-zero makes solid groups textured.
 
@@ -71,7 +72,8 @@ class KARVEL_API CDorPolygon : public CDorGeometry {
 public:
     // NOTE: aligned so that it starts at the same offset under every compiler: GCC would put it
     // in the base's tail padding on 32-bit targets, MSVC never does.
-    alignas(8) CDorArray<DorVector3, DorVector3&> points;  ///< The outline, counter-clockwise about the front side's normal.
+    /// The outline, counter-clockwise about the front side's normal.
+    alignas(8) CDorArray<DorVector3, DorVector3&> points;
     DorVector3 textureAxis;    ///< Texture U runs along it; zero = the plane's own axes.
     DorVector3 textureOrigin;  ///< Shifts the texture; ignored while textureAxis is zero.
 

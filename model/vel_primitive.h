@@ -54,9 +54,12 @@ KARVEL_API bool VelDrawnElementCount(int groupType, int vertexCount, int triangl
 class KARVEL_API CVelTrianglePolys {
 public:
     int GroupType;  ///< VelGroupType; default 4, triangle strip.
-    _DorMaterial material;  ///< Default a yellow: diffuse (0.8, 0.8, 0, 1), ambient (0.4, 0.4, 0, 1), specular (1, 1, 0, 1), shininess 80.
+    /// Default a yellow: diffuse (0.8, 0.8, 0, 1), ambient (0.4, 0.4, 0, 1), specular (1, 1, 0, 1),
+    /// shininess 80.
+    _DorMaterial material;
     CDorArray<_VelVertex, _VelVertex&> vertices;  ///< The vertex list, read by GroupType.
-    CDorArray<_VelTriangleIndex, _VelTriangleIndex&> triangles;  ///< Group type 6 only; a group with an index past its vertices is not drawn.
+    /// Group type 6 only; a group with an index past its vertices is not drawn.
+    CDorArray<_VelTriangleIndex, _VelTriangleIndex&> triangles;
     int RenderKind;   ///< VelRenderKind; other values draw as lit.
     float lineWidth;  ///< Line width and point size in pixels; default 1.
     unsigned int texture;  ///< Name from CVelKarvel::AddTexture; 0 = none.
