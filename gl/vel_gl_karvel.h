@@ -1,11 +1,6 @@
 #pragma once
-// CVelGLKarvel: the OpenGL modeller. It renders its entity store into one device context at a
-// time; every call must come on the thread that initialised it, while its context is current
-// (nothing but Initialize and SetCurrent makes a context current).
-//
-// Lifecycle: constructed (the store works, nothing is drawn, camera, light, viewport and cull
-// operations do nothing) -> Initialize -> live -> Finalize (or the destructor) -> constructed
-// with an empty model. The texture list survives every step.
+/// @file
+/// CVelGLKarvel, the OpenGL modeller.
 //
 // The store operations are in vel_gl_karvel.cpp, context lifecycle in wgl_karvel.cpp, the frame
 // in gl_draw.cpp.
@@ -14,17 +9,33 @@
 #include "../gl/vel_gl_store.h"
 #include "../gl/vel_karvel.h"
 
+/// The OpenGL modeller, the one implementation of CVelKarvel: it renders its entity store into
+/// one device context at a time through OpenGL 1.1. Every call comes on the thread that
+/// initialised it, while its context is current (nothing but Initialize, SetCurrent and ToBitmap
+/// makes a context current). Construct one per view.
+///
+/// Lifecycle: constructed (the store works, nothing is drawn, camera, light, viewport and cull
+/// operations do nothing) -> Initialize -> live -> Finalize (or the destructor) -> constructed
+/// with an empty model. The texture list survives every step. The first Initialize empties the
+/// model: add entities after it, textures before it.
+///
+/// The data members are public for the library's own layout and tests; hosts use the
+/// operations (the classes of the members are not exported from the DLL).
 class KARVEL_API CVelGLKarvel : public CVelKarvel {
 public:
-    CVelGLStructure model;
-    CVelGLRenderState* renderState;  // null until the first successful Initialize; owned
-    CVelGLContext context;
-    double modelScale;  // camera, light positions and offset are kept multiplied by it
+    CVelGLStructure model;  ///< The entities, the texture list and the offset; owned.
+    CVelGLRenderState* renderState;  ///< Null until the first Initialize and after Finalize; owned.
+    CVelGLContext context;  ///< The OpenGL context and the background colour.
+    double modelScale;  ///< 1; camera, light positions and offset are kept multiplied by it.
 
+    /// Constructed: an empty model, no context; no OpenGL call is made.
     CVelGLKarvel();
-    // A copy takes the model, textures, background and scale, and starts uninitialised.
+    /// A copy takes the model, textures, background and scale, and starts uninitialised.
     CVelGLKarvel(const CVelGLKarvel& other);
+    /// Finalizes this modeller, then takes other's model, textures, background and scale;
+    /// uninitialised afterwards.
     CVelGLKarvel& operator=(const CVelGLKarvel& other);
+    /// Finalize: deletes the entities, the render state and the context; frees the textures.
     ~CVelGLKarvel() override;
 
     int Initialize(HDC& dc, _VelViewport viewport) override;
@@ -78,29 +89,35 @@ public:
     void RemoveAllTexture() override;
     CDorArray<_DorBitmap, _DorBitmap&>* GetTextureList() override;
 
-    // On the GL copy directly: normals turn without translation and are renormalised.
+    /// Transforms the entity's stored vertices by matrix in place (row vectors, translation in
+    /// row 3, model units): normals turn without translation and are renormalised. Hides
+    /// CVelKarvel::MoveShape, which also translates normals.
     void MoveShape(_DorPosition* position, DorMatrix4x4& matrix);
-    // The entity's DrawMode, or -1 when the handle holds no entity.
+    /// The entity's DrawMode, or -1 when the handle holds no entity.
     long GetDrawMode(_DorPosition*& position);
+    /// Sets the entity's DrawMode (value 1 hidden, 2 pickable); nothing for an empty handle.
     void SetDrawMode(_DorPosition*& position, long mode);
 
 protected:
     // Pieces of a frame, for every pass that renders the model (drawing, picking, capture).
-    // Context start-up: device hook, lights, fixed state, both viewports.
+    // All of them need the render state and the context current.
+    /// Context start-up: device hook, lights, fixed state, both viewports read back.
     void StartUpContext();
-    // Generates texture names 1..n for the texture list and uploads the images.
+    /// Generates texture names 1..n for the texture list and uploads the images.
     void UploadTextures();
-    // Sets the camera's aspect ratio from the viewport in force.
+    /// Sets the camera's aspect ratio from the viewport in force (kept for a height of 0).
     void FollowViewportAspect();
-    // Camera projection and view, the model offset, lights, line and colour resets, cull mode.
+    /// Camera projection and view, the model offset, lights, line and colour resets, cull mode.
     void SetUpScene();
-    // The camera's view less the model offset, on a fresh modelview matrix.
+    /// The camera's view less the model offset, on a fresh modelview matrix.
     void LoadViewingTransform();
-    // Two-sided mode turns culling off and lights both sides; otherwise back faces are culled.
+    /// Two-sided mode turns culling off and lights both sides; otherwise back faces are culled.
     void ApplyCullMode();
-    // Culling on and the vertex and normal arrays enabled, as every entity pass needs.
+    /// Culling on and the vertex and normal arrays enabled, as every entity pass needs.
     void BeginEntityPass();
+    /// Draws the entity's groups in order.
     void DrawEntity(const CVelGLEntity& entity);
+    /// Draws one group with its material, line width, texture and depth-write rule.
     void DrawGroup(const CVelGLTrianglePolygons& group);
 
 private:

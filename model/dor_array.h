@@ -1,57 +1,77 @@
 #pragma once
-// CDorArray: the growable array of the foundation library.
-//
-// Storage rules that callers rely on:
-// - new elements are zero-filled and then default-constructed;
-// - growing relocates elements bitwise (never copy-constructs them), so an element must not
-//   hold a pointer into itself;
-// - the automatic growth step is size/8 clamped to 4..1024, and a grown array holds
-//   max(newSize, maxSize + step) elements.
-// Indexed access is bounds-checked in debug builds only.
+/// @file
+/// CDorArray, the growable array that every record of the library holds its lists in.
 #include <cassert>
 #include <cstdlib>
 #include <cstring>
 #include <new>
 #include <type_traits>
 
+/// The growable array of the foundation library: TYPE elements, taken by ARG_TYPE (`T&` or `T`
+/// as instantiated). The array owns its elements and their storage.
+///
+/// Storage rules that callers rely on:
+/// - new elements are zero-filled and then default-constructed;
+/// - growing relocates elements bitwise (never copy-constructs them), so an element must not
+///   hold a pointer into itself, and pointers to elements are invalid after any growth;
+/// - the automatic growth step is size/8 clamped to 4..1024, and a grown array holds
+///   max(newSize, maxSize + step) elements.
+///
+/// Indexed access is bounds-checked in debug builds only. A failed allocation throws
+/// std::bad_alloc. Not thread-safe; the library never shares one array between threads.
 template <class TYPE, class ARG_TYPE = const TYPE&>
 class CDorArray {
 public:
-    TYPE* data;   // null when the array has no storage
-    int size;     // elements in use
-    int maxSize;  // elements allocated
-    int growBy;   // growth step; 0 = automatic
+    TYPE* data;   ///< Element storage; null when the array has no storage.
+    int size;     ///< Elements in use.
+    int maxSize;  ///< Elements allocated.
+    int growBy;   ///< Growth step; 0 = automatic.
 
+    /// An empty array with no storage and automatic growth.
     CDorArray() : data(nullptr), size(0), maxSize(0), growBy(0) {}
+    /// A deep copy: sized to other's count, then element-wise assignment.
     CDorArray(const CDorArray& other) : data(nullptr), size(0), maxSize(0), growBy(0) { CopyFrom(other); }
+    /// Sizes to other's count (keeping the growth step) and assigns element by element.
     CDorArray& operator=(const CDorArray& other)
     {
         if (this != &other)
             CopyFrom(other);
         return *this;
     }
+    /// Destroys every element and frees the storage.
     ~CDorArray() { SetSize(0); }
 
+    /// The number of elements in use.
     int GetSize() const { return size; }
+    /// The element storage (null when empty); valid until the array next grows or empties.
     TYPE* GetData() { return data; }
+    /// @copydoc GetData()
     const TYPE* GetData() const { return data; }
 
+    /// Element i, 0 <= i < GetSize(); not checked in release builds.
     TYPE& operator[](int i)
     {
         assert(i >= 0 && i < size);
         return data[i];
     }
+    /// @copydoc operator[](int)
     const TYPE& operator[](int i) const
     {
         assert(i >= 0 && i < size);
         return data[i];
     }
 
+    /// Destroys every element and frees the storage; the same as SetSize(0).
     void RemoveAll() { SetSize(0); }
 
+    /// Resizes to newSize elements: 0 (or below) destroys every element and frees the storage;
+    /// growing zero-fills and default-constructs the new elements, relocating the old ones
+    /// bitwise when the capacity runs out; shrinking destroys the surplus and keeps the storage.
+    /// newGrowBy other than -1 replaces the growth step first.
     void SetSize(int newSize, int newGrowBy = -1) { Resize(newSize, newGrowBy, true); }
 
-    // Stores a copy of element at index, growing the array first when index is past the end.
+    /// Stores a copy of element at index (0 or more), growing the array first when index is past
+    /// the end. element may be one of this array's own elements.
     void SetAtGrow(int index, ARG_TYPE element)
     {
         assert(index >= 0);
@@ -76,6 +96,7 @@ public:
         }
     }
 
+    /// Appends a copy of element (growing by the rule above) and returns its index.
     int Add(ARG_TYPE element)
     {
         int index = size;

@@ -1,6 +1,11 @@
 #pragma once
-// KARVEL_API marks the classes that karvel.dll exports. Define KARVEL_STATIC to link the
-// library's sources statically (the test programs do); KARVEL_BUILD is set while building the DLL.
+/// @file
+/// The export macro of karvel.dll.
+///
+/// @def KARVEL_API
+/// Marks what karvel.dll exports: dllimport in a host, dllexport while the DLL is built
+/// (KARVEL_BUILD), nothing when KARVEL_STATIC is defined (the library's own tests link its
+/// sources statically) or off Windows.
 #if defined(_WIN32) && !defined(KARVEL_STATIC)
 #  if defined(KARVEL_BUILD)
 #    define KARVEL_API __declspec(dllexport)

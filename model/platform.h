@@ -1,7 +1,9 @@
 #pragma once
-// The one place where the portable tier meets Windows handle types. On Windows this is
-// <windows.h> itself; elsewhere the handles are opaque pointer types of the same shape, so the
-// interfaces compile and their own behaviour can be tested without Windows.
+/// @file
+/// The Windows handle types of the interface (HDC, HWND, HGLRC, HBITMAP). On Windows this is
+/// <windows.h> itself, so a host's own handles pass straight through; elsewhere the handles are
+/// opaque pointer types of the same shape, so the interfaces compile and their own behaviour can
+/// be tested without Windows.
 #if defined(_WIN32)
 #  include <windows.h>
 #else

@@ -29,6 +29,9 @@ for preset in mingw64 mingw32; do
 done
 
 status=0
+echo "== reference: every public class and operation documented"
+scripts/docs.sh --check || status=1
+
 echo "== native tests"
 ctest --preset native || status=1
 
