@@ -17,7 +17,7 @@ karvel_require_packages() {
 }
 
 KARVEL_BUILD_PACKAGES=(cmake make g++ mingw-w64 wine wine64 xvfb xauth libosmesa6 googletest
-                       libbenchmark-dev nlohmann-json3-dev libstb-dev)
+                       libbenchmark-dev nlohmann-json3-dev libstb-dev libglu1-mesa-dev)
 
 # Creates the throwaway Wine prefix of a build tree once, so that tests do not race to make it.
 karvel_wine_env() {
