@@ -68,6 +68,8 @@ void VelEdgeGraph::AddLoopEdges(int first, int count)
 bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
 {
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
+    if (along.x == 0.0 && along.y == 0.0)
+        return false;  // every determinant would be 0 (or NaN)
     const int count = static_cast<int>(edges.size());
     for (int k = loopEdgeCount; k < count + loopEdgeCount; ++k) {
         const int at = k < count ? k : k - count;
@@ -87,6 +89,8 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
 {
     const DorVector2 a = plane[i], d = VelSub2(plane[j], a);
     const double lengthSquared = VelDot2(d, d);
+    if (lengthSquared == 0.0)
+        return false;  // a zero-length segment holds no point
     const bool screen = finite && extent < 1e150 && lengthSquared > 1e-200;
     const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
     for (int k = 0; k < static_cast<int>(plane.size()); ++k) {
