@@ -1,5 +1,6 @@
 #include "convert/vel_edge_graph.h"
 
+#include <algorithm>
 #include <cmath>
 
 #include "convert/vel_plane2d.h"
@@ -14,6 +15,7 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 {
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
+    spans.reserve(maxEdges > 0 ? maxEdges : 0);
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
@@ -21,37 +23,108 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
     for (int k = 0; k < count; ++k) {
         DorVector3 p = DorTransformPoint(points[k], projection);
         plane.push_back(DorVector2(p.x, p.y));
+        finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
+        extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
+    }
+}
+
+void VelEdgeGraph::Append(int start, int end)
+{
+    edges.push_back(Edge{start, end, 0, -1, -1});
+    spans.push_back(Span{plane[start], VelSub2(plane[end], plane[start])});
+}
+
+void VelEdgeGraph::AddSegment(int i, int j)
+{
+    const int k = static_cast<int>(edges.size());
+    Append(i, j);
+    firstAppended.resize(plane.size(), -1);
+    lastAppended.resize(plane.size(), -1);
+    for (int v : {i, j}) {
+        int last = lastAppended[v];
+        if (last < 0)
+            firstAppended[v] = k;
+        else
+            (edges[last].start == v ? edges[last].nextAtStart : edges[last].nextAtEnd) = k;
+        lastAppended[v] = k;
+        if (i == j)
+            break;  // a zero-length edge is listed once
     }
 }
 
 void VelEdgeGraph::AddLoopEdges(int first, int count)
 {
-    for (int k = 0; k < count; ++k)
-        edges.push_back(Edge{first + k, first + (k + 1 < count ? k + 1 : 0), 0});
+    loopEdgeFrom.resize(plane.size(), -1);
+    loopEdgeInto.resize(plane.size(), -1);
+    for (int k = 0; k < count; ++k) {
+        int end = first + (k + 1 < count ? k + 1 : 0);
+        loopEdgeFrom[first + k] = loopEdgeInto[end] = static_cast<int>(edges.size());
+        Append(first + k, end);
+    }
     loopEdgeCount = static_cast<int>(edges.size());
 }
 
 // The appended edges are tried before the loops' own: they are the ones that usually cross.
 bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
 {
+    const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
+    if (along.x == 0.0 && along.y == 0.0)
+        return false;  // every determinant would be 0 (or NaN)
     const int count = static_cast<int>(edges.size());
     for (int k = loopEdgeCount; k < count + loopEdgeCount; ++k) {
-        const Edge& e = edges[k < count ? k : k - count];
+        const int at = k < count ? k : k - count;
+        const Edge& e = edges[at];
         if (e.start == i || e.start == j || e.end == i || e.end == j)
             continue;
-        if (VelSegmentsCross(plane[i], plane[j], plane[e.start], plane[e.end]))
+        if (VelSegmentsCrossAlong(from, along, spans[at].from, spans[at].along))
             return true;
     }
     return false;
 }
 
+// A point is looked at closely only when it lies across the segment's slab and near its line:
+// there the rounding of the foot and the distance is below 1e-14 of the extent, so a point
+// farther than 1e-6 plus that from the line is never taken to be on it.
 bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
 {
+    const DorVector2 a = plane[i], d = VelSub2(plane[j], a);
+    const double lengthSquared = VelDot2(d, d);
+    if (lengthSquared == 0.0)
+        return false;  // a zero-length segment holds no point
+    const bool screen = finite && extent < 1e150 && lengthSquared > 1e-200;
+    const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
     for (int k = 0; k < static_cast<int>(plane.size()); ++k) {
-        if (k != i && k != j && VelPointOnSegment(plane[k], plane[i], plane[j]))
+        if (k == i || k == j)
+            continue;
+        if (screen) {
+            DorVector2 w = VelSub2(plane[k], a);
+            double along = VelDot2(w, d);
+            if (!(along > 0.0 && along < lengthSquared))  // t = along / lengthSquared outside (0, 1)
+                continue;
+            double across = VelCross2(w, d);
+            if (across * across > reachSquared * lengthSquared)
+                continue;
+        }
+        if (VelPointOnSegment(plane[k], a, plane[j]))
             return true;
     }
     return false;
+}
+
+template <typename F>
+void VelEdgeGraph::ForEdgesAt(int v, F f) const
+{
+    int from = v < static_cast<int>(loopEdgeFrom.size()) ? loopEdgeFrom[v] : -1;
+    int into = v < static_cast<int>(loopEdgeInto.size()) ? loopEdgeInto[v] : -1;
+    if (from > into)
+        std::swap(from, into);
+    if (from >= 0)
+        f(from);
+    if (into >= 0 && into != from)
+        f(into);
+    for (int k = v < static_cast<int>(firstAppended.size()) ? firstAppended[v] : -1; k >= 0;
+         k = edges[k].start == v ? edges[k].nextAtStart : edges[k].nextAtEnd)
+        f(k);
 }
 
 // The other end of the edge at s whose direction is nearest to u on the wanted side of it,
@@ -60,33 +133,34 @@ int VelEdgeGraph::BestNeighbour(int c, int s, const DorVector2& u, bool clockwis
 {
     double best = -1024.0;
     int found = -1;
-    for (int k = 0; k < static_cast<int>(edges.size()); ++k) {
+    ForEdgesAt(s, [&](int k) {
         const Edge& e = edges[k];
-        if (k == c || (e.start != s && e.end != s))
-            continue;
+        if (k == c)
+            return;
         int x = e.start == s ? e.end : e.start;
         DorVector2 v = VelSub2(plane[x], plane[s]);
         VelNormalize2(v);
         double cross = VelCross2(u, v);
         if (clockwise ? !(cross < 0.0) : !(cross > 0.0))
-            continue;
+            return;
         double dot = VelDot2(u, v);
         if (dot > best) {
             best = dot;
             found = x;
         }
-    }
+    });
     return found;
 }
 
 int VelEdgeGraph::FindEdge(int p, int q) const
 {
-    for (int k = 0; k < static_cast<int>(edges.size()); ++k) {
+    int found = -1;
+    ForEdgesAt(p, [&](int k) {
         const Edge& e = edges[k];
-        if ((e.start == p && e.end == q) || (e.start == q && e.end == p))
-            return k;
-    }
-    return -1;
+        if (found < 0 && (e.start == p ? e.end : e.start) == q)
+            found = k;
+    });
+    return found;
 }
 
 // Marks the side of the edge on which the counter-clockwise triangle (a, b, x) lies: its left

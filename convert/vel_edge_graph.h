@@ -20,7 +20,7 @@ public:
     void AddLoopEdges(int first, int count);
 
     bool HasRoom() const { return static_cast<int>(edges.size()) < maxEdges; }
-    void AddSegment(int i, int j) { edges.push_back(Edge{i, j, 0}); }
+    void AddSegment(int i, int j);
 
     // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
     bool CrossesListedEdge(int i, int j) const;
@@ -41,8 +41,17 @@ public:
 private:
     struct Edge {
         int start, end, sides;
+        int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
+    };
+    // An edge's start and its end minus its start, as the crossing test forms them.
+    struct Span {
+        DorVector2 from, along;
     };
 
+    void Append(int start, int end);
+    // Calls f(k) for every edge k with v as an end, in list order, each once.
+    template <typename F>
+    void ForEdgesAt(int v, F f) const;
     int BestNeighbour(int c, int s, const DorVector2& u, bool clockwise) const;
     bool CloseTriangle(int a, int b, int x);
     void MarkSide(int edge, int a, int b, int x);
@@ -52,5 +61,11 @@ private:
     int maxEdges;
     int loopEdgeCount = 0;
     std::vector<Edge> edges;
+    std::vector<Span> spans;  // per edge
+    std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
+    std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none
+    // The largest coordinate magnitude, and whether every coordinate is finite.
+    double extent = 0.0;
+    bool finite = true;
     std::vector<int> candidates;  // three per triangle
 };

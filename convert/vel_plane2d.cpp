@@ -42,6 +42,98 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int*
 
 bool VelWindingInside(double angleSum) { return std::fabs(angleSum) > kPi; }
 
+bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1)
+{
+    return VelSegmentsCrossAlong(p0, VelSub2(p1, p0), a0, VelSub2(a1, a0));
+}
+
+namespace {
+enum Verdict { kOutside, kInside, kUnsure };
+
+// Where every edge's term is clear of atan2's cut at +-pi, each computed term is within 1e-14 of
+// the exact angle between the same rounded vectors u = P - q, and the exact angles add up to 2 pi
+// times the winding number of the u loop about 0 (a repeated point's term is exactly 0, and clear).
+// The sum's rounding stays below n^2 * 2e-16, so
+// |sum| > pi exactly when that number, counted by signed crossings of the ray y = 0, x > 0, is not
+// 0. A term is clear when its cross product is far above its rounding (then its sign is exact) or
+// its dot product is positive and the edge does not meet the ray's line. With q on one vertex the
+// two terms at it drop out; the rest of the loop, closed by the chord between the neighbours,
+// winds about 0, and the chord's own angle must then keep off +-pi by more than the rounding.
+// NaN, infinity and extreme magnitudes are never clear.
+struct Term {
+    double cross, dot, size;
+    Term(const DorVector2& u, const DorVector2& v)
+        : cross(VelCross2(u, v)), dot(VelDot2(u, v)),
+          size((std::fabs(u.x) + std::fabs(u.y)) * (std::fabs(v.x) + std::fabs(v.y)))
+    {
+    }
+    bool InRange() const { return size > 1e-250 && size < 1e250; }
+};
+
+const double kClear = 1e-12;
+
+bool IsZero(const DorVector2& u) { return u.x == 0.0 && u.y == 0.0; }
+
+// The signed crossing of the ray by u->v, or kUnsure.
+int RayCrossing(const DorVector2& u, const DorVector2& v, double margin)
+{
+    Term term(u, v);
+    if (!term.InRange())
+        return kUnsure;
+    if (!(std::fabs(term.cross) > margin * term.size)) {
+        bool meetsLine = (u.y <= 0.0) != (v.y <= 0.0);
+        return term.dot > kClear * term.size && !meetsLine ? 0 : kUnsure;
+    }
+    if (u.y <= 0.0 && v.y > 0.0)
+        return term.cross > 0.0 ? 1 : 0;
+    if (v.y <= 0.0 && u.y > 0.0)
+        return term.cross < 0.0 ? -1 : 0;
+    return 0;
+}
+
+Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count)
+{
+    if (count < 3 || count > 1000000)
+        return kUnsure;
+    const double sumError = count * 1e-14 + static_cast<double>(count) * count * 2e-16;
+    int winding = 0, onVertex = -1;
+    DorVector2 u = VelSub2(loop[0], q);
+    for (int k = 0; k < count; ++k) {
+        int next = k + 1 < count ? k + 1 : 0;
+        DorVector2 v = VelSub2(loop[next], q);
+        if (IsZero(u) || IsZero(v)) {
+            int at = IsZero(u) ? k : next;
+            if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
+                return kUnsure;
+            onVertex = at;
+        } else {
+            int crossing = RayCrossing(u, v, kClear);
+            if (crossing == kUnsure)
+                return kUnsure;
+            winding += crossing;
+        }
+        u = v;
+    }
+    if (onVertex >= 0) {
+        DorVector2 before = VelSub2(loop[onVertex > 0 ? onVertex - 1 : count - 1], q);
+        DorVector2 after = VelSub2(loop[onVertex + 1 < count ? onVertex + 1 : 0], q);
+        int crossing = RayCrossing(before, after, kClear + 8 * sumError);
+        if (crossing == kUnsure)
+            return kUnsure;
+        winding += crossing;
+    }
+    return winding != 0 ? kInside : kOutside;
+}
+}  // namespace
+
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count)
+{
+    Verdict verdict = WindingVerdict(q, loop, count);
+    if (verdict != kUnsure)
+        return verdict == kInside;
+    return VelWindingInside(VelWindingAngle(q, loop, count));
+}
+
 bool VelOnLoopEdge(const DorVector2& q, const DorVector2* loop, int count)
 {
     for (int k = 0; k < count; ++k) {

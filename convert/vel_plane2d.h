@@ -1,6 +1,8 @@
 #pragma once
 // Plane geometry shared by both triangulations. They work on outlines already projected into
 // their own plane (x, y of the plane projection), where counter-clockwise is positive.
+#include <cmath>
+
 #include "model/dor_types.h"
 
 inline double VelCross2(const DorVector2& a, const DorVector2& b) { return a.x * b.y - a.y * b.x; }
@@ -16,17 +18,21 @@ void VelNormalize2(DorVector2& v);
 
 // Whether segment p0-p1 crosses segment a0-a1 at a point strictly inside both. Parallel segments
 // (cross product exactly 0) never cross.
+bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1);
+
+// The same for p0 + d and a0 + e with d = p1 - p0, e = a1 - a0 already formed.
 // Inline: the triangulations call it for every candidate against every listed edge.
-inline bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1)
+inline bool VelSegmentsCrossAlong(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
 {
-    DorVector2 d = VelSub2(p1, p0), e = VelSub2(a1, a0);
     double det = VelCross2(e, d);
-    if (det == 0.0)
-        return false;
     // p0 + s d = a0 + t e
     DorVector2 w = VelSub2(a0, p0);
-    double s = VelCross2(e, w) / det;
-    double t = VelCross2(d, w) / det;
+    double sNum = VelCross2(e, w), tNum = VelCross2(d, w);
+    // A quotient lies in (0, 1) only when its numerator is smaller than det: most edges are
+    // settled without dividing. Also false for det = 0 and for NaN, as the quotients would be.
+    if (!(std::fabs(sNum) < std::fabs(det) && std::fabs(tNum) < std::fabs(det)))
+        return false;
+    double s = sNum / det, t = tNum / det;
     return s > 0.0 && s < 1.0 && t > 0.0 && t < 1.0;
 }
 
@@ -40,6 +46,10 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int*
 
 // Whether a winding sum puts its point inside: |sum| > pi.
 bool VelWindingInside(double angleSum);
+
+// VelWindingInside(VelWindingAngle(q, loop, count)), without the angles wherever the winding
+// number alone provably gives the same answer.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count);
 
 // Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
 // vectors from q to the edge's ends is below 0.0001 in magnitude and, once both are normalised,

@@ -13,7 +13,7 @@ bool Admissible(const VelEdgeGraph& graph, int i, int j)
     if (graph.CrossesListedEdge(i, j) || graph.PassesThroughPoint(i, j))
         return false;
     DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-    return VelWindingInside(VelWindingAngle(mid, graph.plane.data(), static_cast<int>(graph.plane.size())));
+    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size()));
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter

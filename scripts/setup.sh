@@ -18,7 +18,7 @@ karvel_require_packages() {
 
 KARVEL_BUILD_PACKAGES=(cmake make g++ binutils mingw-w64 binutils-mingw-w64-x86-64 binutils-mingw-w64-i686
                        wine wine64 xvfb xauth libosmesa6 googletest
-                       libbenchmark-dev nlohmann-json3-dev libstb-dev doxygen)
+                       libbenchmark-dev nlohmann-json3-dev libstb-dev doxygen libglu1-mesa-dev)
 
 # Creates the throwaway Wine prefix of a build tree once, so that tests do not race to make it.
 karvel_wine_env() {
