@@ -41,8 +41,7 @@ TEST_F(LiveModeller, OrbitTurnsAboutTheTargetUntilTheFlagIsClearedAndStopsAtAQui
     double turned = Azimuth(camera) - Azimuth(start);  // 90 degrees a second for ~0.3 s
     EXPECT_GT(turned, 10);
     EXPECT_LT(turned, 90);
-    EXPECT_NEAR(DorLength(camera.eye - camera.target), DorLength(start.eye - start.target), 1e-9);
-    EXPECT_NEAR(camera.eye.z, start.eye.z, 1e-9);
+    EXPECT_NEAR(camera.eye.z, start.eye.z, 1e-9);  // about the target's vertical
 
     // A quit ends it and is posted again for the host; a cleared flag or no window ends it at once.
     running = 1;

@@ -37,35 +37,32 @@ unsigned int NextGdiSlot()
 }
 }  // namespace
 
-// A red square up and right of the centre and a textured rectangle down left, on blue.
-class Capture : public LiveModeller {
-protected:
-    void SetUp() override
-    {
-        LiveModeller::SetUp();
-        DorColorValue blue(0, 0, 1, 1);
-        karvel.SetBkColor(blue);
-        Add(Rectangle(2, 1, 6, 5, 0, Matte(1, 0, 0)));
-        Add(Rectangle(-6, -4, -2, -2, 0, Matte(1, 0, 0), true));
-    }
-
-    _DorBitmap Take(int left, int top, int right, int bottom)
-    {
+// A red square up and right of the centre and a textured rectangle down left, on blue, captured
+// at several sizes; then the window draws as before, and captures leak nothing.
+TEST_F(LiveModeller, CapturesShowTheModelLeaveTheWindowAsItWasAndLeakNothing)
+{
+    DorColorValue blue(0, 0, 1, 1);
+    karvel.SetBkColor(blue);
+    Add(Rectangle(2, 1, 6, 5, 0, Matte(1, 0, 0)));
+    Add(Rectangle(-6, -4, -2, -2, 0, Matte(1, 0, 0), true));
+    auto take = [&](int left, int top, int right, int bottom) {
         _DORRECT rect = {left, top, right, bottom};
         _DorBitmap bitmap;
         karvel.ToBitmap(bitmap, rect);
         return bitmap;
-    }
-};
-
-TEST_F(Capture, PicturesOfEachSizeShowTheModelAndTheWindowDrawsAsBefore)
-{
+    };
     Rgb before = Draw(4, 3);
     // Odd width (padded rows), corners in the other order away from the origin, larger than
     // the window; then sizes that give an empty bitmap.
     const int rects[][4] = {{0, 0, 101, 50}, {301, 250, 200, 200}, {0, 0, 640, 480}, {0, 0, 0, 50}, {0, 0, 100000, 10}};
+    // Model points (x, 0, z): the square, black and white texels, and beside the square and mirrored.
+    const struct {
+        double x, z;
+        char colour;
+    } spots[] = {{4, 3, 'r'}, {-5, -3, 'r'}, {-3, -3, 'k'}, {1.5, 3, 'b'}, {6.5, 3, 'b'},
+                 {4, 0.5, 'b'}, {4, 5.5, 'b'}, {-4, 3, 'b'}, {4, -3, 'b'}};
     for (const auto& r : rects) {
-        _DorBitmap bitmap = Take(r[0], r[1], r[2], r[3]);
+        _DorBitmap bitmap = take(r[0], r[1], r[2], r[3]);
         int w = std::abs(r[2] - r[0]), h = std::abs(r[3] - r[1]);
         SCOPED_TRACE(testing::Message() << w << "x" << h);
         EXPECT_EQ(karvel.GetCurrent(), window.dc);
@@ -75,38 +72,24 @@ TEST_F(Capture, PicturesOfEachSizeShowTheModelAndTheWindowDrawsAsBefore)
         }
         ASSERT_EQ(bitmap.info.width, w);
         ASSERT_EQ(bitmap.bits.GetSize(), DorBitmapRowBytes(w, 24) * h);
-        // Model point (x, 0, z) in the picture, as a red, blue or black (white texel) pixel.
-        auto expect = [&](double x, double z, char colour) {
-            int col = static_cast<int>(w / 2.0 + x / 10 * h / 2.0), row = static_cast<int>(h / 2.0 - z / 10 * h / 2.0);
+        for (const auto& s : spots) {
+            int col = static_cast<int>(w / 2.0 + s.x / 10 * h / 2.0), row = static_cast<int>(h / 2.0 - s.z / 10 * h / 2.0);
             const unsigned char* p = bitmap.bits.GetData() + (h - 1 - row) * DorBitmapRowBytes(w, 24) + 3 * col;
             bool red = p[2] > 150 && p[0] < 30, blue = p[0] == 255 && p[2] == 0, black = p[0] < 20 && p[2] < 20;
-            EXPECT_TRUE(colour == 'r' ? red : colour == 'b' ? blue : black) << x << ", " << z << " " << colour;
-        };
-        expect(4, 3, 'r');
-        expect(-5, -3, 'r');  // the black texels show the lit red
-        expect(-3, -3, 'k');  // the white ones blend it away
-        const double beside[][2] = {{1.5, 3}, {6.5, 3}, {4, 0.5}, {4, 5.5}, {-4, 3}, {4, -3}};  // and mirrored
-        for (const auto& spot : beside)
-            expect(spot[0], spot[1], 'b');
+            EXPECT_TRUE(s.colour == 'r' ? red : s.colour == 'b' ? blue : black) << s.x << ", " << s.z;
+        }
     }
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    EXPECT_DOUBLE_EQ(camera.aspect, static_cast<double>(kWidth) / kHeight);
-    Rgb after = Draw(4, 3);
-    EXPECT_EQ(after.r, before.r);
+    EXPECT_EQ(Draw(4, 3).r, before.r);
     EXPECT_EQ(At(1.5, 3).b, 255);
     EXPECT_TRUE(glIsTexture(1));  // uploaded again in the window's context
-}
 
-// One leaked DIB section per capture would be 1 MB at this size, a leaked context far more.
-TEST_F(Capture, CapturesLeaveGdiObjectsAndMemoryFlat)
-{
-    Take(0, 0, 512, 512);
+    // One leaked DIB section per capture would be 2 MB at this size.
+    take(0, 0, 1024, 512);
     DWORD gdiObjects = GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS);
     unsigned int slot = NextGdiSlot();
     size_t memory = CommittedBytes();
     for (int i = 0; i < 10; ++i)
-        Take(0, 0, 512, 512);
+        take(0, 0, 1024, 512);
     EXPECT_EQ(GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS), gdiObjects);
     EXPECT_EQ(NextGdiSlot(), slot);
     EXPECT_LT(CommittedBytes(), memory + 4 * 1024 * 1024) << memory << " -> " << CommittedBytes();
