@@ -44,15 +44,20 @@ public:
         CloseHandle(process_.hThread);
         CloseHandle(output_);
     }
-    // Waits for the end: the exit code (~0 when none), and what was printed into output.
+    // Waits up to a minute for the end: the exit code (~0 when none), and what was printed.
+    // NOTE: under Wine a service that the viewer starts may inherit the pipe's write end and keep
+    // it open, so the output ends when the process does, not when the pipe closes.
     DWORD Finish(std::string& output)
     {
         char buffer[4096];
-        for (DWORD got = 0; ReadFile(output_, buffer, sizeof buffer, &got, nullptr) && got > 0;)
-            output.append(buffer, got);
-        DWORD code = ~0u;
-        if (WaitForSingleObject(process_.hProcess, 20000) == WAIT_OBJECT_0)
-            GetExitCodeProcess(process_.hProcess, &code);
+        DWORD code = ~0u, got = 0, waiting = 0;
+        for (int tries = 0, exited = 0; !exited && tries < 1200; ++tries) {
+            exited = WaitForSingleObject(process_.hProcess, 50) == WAIT_OBJECT_0;
+            while (PeekNamedPipe(output_, nullptr, 0, nullptr, &waiting, nullptr) && waiting > 0 &&
+                   ReadFile(output_, buffer, sizeof buffer, &got, nullptr))
+                output.append(buffer, got);
+        }
+        GetExitCodeProcess(process_.hProcess, &code);
         return code;
     }
 
