@@ -19,7 +19,6 @@ struct CBitmap {
 #include <cstring>
 #include <fstream>
 #include <iterator>
-#include <map>
 #include <string>
 #include <thread>
 #include <vector>
@@ -66,39 +65,31 @@ uint32_t U32(const Bytes& d, size_t at)
     return v;
 }
 
-typedef std::map<std::string, std::vector<Bytes>> Chunks;  // by kind in file order; "frame": video
-
-void Walk(const Bytes& d, size_t at, size_t end, Chunks& out)
+// Where n bytes from p first occur in d at or after from; d's size when they do not.
+size_t Find(const Bytes& d, const void* p, size_t n, size_t from)
 {
-    for (size_t size; at + 8 <= end && (size = U32(d, at + 4)) <= end - at - 8; at += 8 + size + (size & 1)) {
-        std::string id(d.begin() + at, d.begin() + at + 4);
-        if (id == "LIST")
-            Walk(d, at + 12, at + 8 + size, out);
-        else
-            out[id == "00db" || id == "00dc" ? "frame" : id].emplace_back(d.data() + at + 8, d.data() + at + 8 + size);
-    }
+    const unsigned char* bytes = static_cast<const unsigned char*>(p);
+    return std::search(d.begin() + std::min(from, d.size()), d.end(), bytes, bytes + n) - d.begin();
 }
 
-// The file holds exactly these frames, all key frames, with the first frame's header and palette
-// as the stream format. The stream header's values are checked natively.
+// The file holds exactly these frames in order, each a chunk of its own and a key frame, and
+// the first frame's header and palette as the stream format. The stream header's values are
+// checked natively.
 void ExpectMovie(const char* path, const std::vector<_DorBitmap>& frames)
 {
     std::ifstream in(path, std::ios::binary);
     Bytes d((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
-    Chunks avi;
-    if (d.size() >= 12 && !std::memcmp(&d[0], "RIFF", 4) && !std::memcmp(&d[8], "AVI ", 4))
-        Walk(d, 12, std::min<size_t>(d.size(), 8 + size_t(U32(d, 4))), avi);
-    Bytes idx = avi["idx1"].empty() ? Bytes() : avi["idx1"][0];
     const _DorBitmap& first = frames[0];
     Bytes format(reinterpret_cast<const unsigned char*>(&first.info), reinterpret_cast<const unsigned char*>(&first.info + 1));
     const unsigned char* palette = reinterpret_cast<const unsigned char*>(first.palette.GetData());
     format.insert(format.end(), palette, palette + 4 * first.palette.GetSize());
-    EXPECT_TRUE(avi["strf"].size() == 1 && avi["strf"][0] == format);
-    ASSERT_EQ(avi["frame"].size(), frames.size());
-    for (size_t i = 0; i < frames.size(); ++i) {
-        const _DorBitmap& f = frames[i];
-        EXPECT_TRUE(avi["frame"][i] == Bytes(f.bits.GetData(), f.bits.GetData() + f.bits.GetSize())) << "frame " << i;
-        EXPECT_TRUE(U32(idx, 16 * i + 4) & AVIIF_KEYFRAME) << "frame " << i;
+    size_t at = Find(d, "strf", 4, 0) + 8, index = Find(d, "idx1", 4, 0) + 8;
+    EXPECT_TRUE(U32(d, at - 4) == format.size() && Find(d, format.data(), format.size(), at) == at);
+    ASSERT_EQ(U32(d, index - 4), 16 * frames.size());
+    for (size_t i = 0; i < frames.size(); ++i, at += 8) {
+        at = Find(d, frames[i].bits.GetData(), frames[i].bits.GetSize(), at);
+        EXPECT_EQ(U32(d, at - 4), uint32_t(frames[i].bits.GetSize())) << "frame " << i;
+        EXPECT_TRUE(U32(d, index + 16 * i + 4) & AVIIF_KEYFRAME) << "frame " << i;
     }
 }
 

@@ -6,6 +6,7 @@
 #include <GL/gl.h>
 
 #include "gl/vel_gl_karvel.h"
+#include "model/dor_bitmap.h"
 #include "support/win32_test_window.h"
 
 const int kWidth = 160;
@@ -89,10 +90,7 @@ protected:
     void SetUp() override
     {
         _DorBitmap texture;
-        texture.info.width = 4;
-        texture.info.height = 1;
-        texture.info.bitCount = 24;
-        texture.bits.SetSize(DorBitmapRowBytes(4, 24));
+        DorBitmapAllocate(texture, 4, 1, 24);
         for (int i = 6; i < 12; ++i)
             texture.bits[i] = 255;
         ASSERT_EQ(karvel.AddTexture(texture), 1u);
@@ -114,11 +112,6 @@ protected:
         int col, row;
         PixelOf(x, 0, z, col, row);
         return PixelAt(col, row);
-    }
-    Rgb Draw(double x, double z)
-    {
-        karvel.DrawModel(window.dc);
-        return At(x, z);
     }
     _DorPosition* Add(CVelPrimitive p) { return karvel.AddPrimitive(p); }
 

@@ -30,7 +30,6 @@ public:
         startup.cb = sizeof(startup);
         startup.dwFlags = STARTF_USESTDHANDLES;
         startup.hStdOutput = startup.hStdError = writeEnd;
-        startup.hStdInput = GetStdHandle(STD_INPUT_HANDLE);
         std::string command = Quoted(KARVEL_VIEWER_EXE) + " " + arguments;
         CreateProcessA(nullptr, &command[0], nullptr, nullptr, TRUE, 0, nullptr, folder.empty() ? nullptr : folder.c_str(),
                        &startup, &process_);
