@@ -26,16 +26,8 @@ TEST(MovieStreamInfo, DescribesAnUncompressedStreamNamedByItsFirstCharacter)
 {
     const char* names[] = {"Camera", "", nullptr};
     for (const char* name : names) {
-        VelAviStreamInfo expected;
-        std::memset(&expected, 0, sizeof(expected));
-        expected.fccType = 0x73646976;     // "vids" as it is stored
-        expected.fccHandler = 0x20424944;  // "DIB "
-        expected.scale = 1;
-        expected.rate = 25;
-        expected.length = 300;
-        expected.quality = 0xFFFFFFFFu;
-        expected.frameRight = 640;
-        expected.frameBottom = 360;
+        // "vids" and "DIB " as they are stored, a frame per 1/25 s, 300 frames.
+        VelAviStreamInfo expected = {0x73646976, 0x20424944, 0, 0, 0, 0, 1, 25, 0, 300, 0, 0, 0xFFFFFFFFu, 0, 0, 0, 640, 360};
         expected.name[0] = name && *name ? 'C' : '\0';
         VelAviStreamInfo info = VelMovieStreamInfo(Frame(640, 360, 24).info, 25, name, 300);
         EXPECT_EQ(std::memcmp(&info, &expected, sizeof(info)), 0) << (name ? name : "null");

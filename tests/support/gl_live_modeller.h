@@ -30,8 +30,6 @@ inline Rgb PixelAt(int col, int row)
     return Rgb{rgba[0], rgba[1], rgba[2]};
 }
 
-inline bool IsBlack(const Rgb& c) { return c.r == 0 && c.g == 0 && c.b == 0; }
-
 inline _DorMaterial Matte(float r, float g, float b, float alpha = 1)
 {
     _DorMaterial m;
