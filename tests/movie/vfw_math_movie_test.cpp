@@ -1,6 +1,6 @@
-// Records movies into files and reads them back chunk by chunk, as a player does.
+// Records movies into files and finds what they hold in the bytes written, as a player reads it.
 // NOTE: 64-bit Wine's AVIFileOpenA cannot read these files back (it fails with AVIERR_BADFORMAT
-// looking for the main header), so the RIFF chunks are parsed here instead.
+// looking for the main header), so the chunks are looked up here instead.
 #include <windows.h>
 
 // An MFC host includes MFC first and so gets the CBitmap overloads. MFC does not exist for this
