@@ -1,6 +1,10 @@
 #pragma once
 // CVelKarvel: the modeller interface through which a host drives the library. The order of the
 // virtual operations is part of the binary interface: never reorder or insert.
+// The /* n */ comments number declarations, not virtual table slots. Compilers lay slots out
+// differently: Microsoft's puts overloads in reverse declaration order (Initialize(HDC&) comes
+// before Initialize(HDC&, _VelViewport)) and gives the destructor one slot, GCC's two.
+// scripts/msabi/CVelKarvel.vftable pins Microsoft's layout and scripts/check-msabi.sh checks it.
 // Every operation runs on the thread that initialised the modeller (OpenGL contexts are bound to
 // a thread); the library takes no locks.
 #include "camera/vel_camera.h"
