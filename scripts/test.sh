@@ -1,26 +1,45 @@
 #!/usr/bin/env bash
 # Builds the three presets and runs every test: the portable tests natively under ASan and
-# UBSan, then the Windows tests under Wine on a virtual X display. Exits non-zero on any failure.
+# UBSan, the Windows tests under 64-bit Wine on a virtual X display, the 32-bit Windows tests
+# under 32-bit Wine where the machine can run them, and the Microsoft-ABI check. Prints the time
+# of each stage. Exits non-zero on any failure.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/setup.sh
 karvel_require_packages "${KARVEL_BUILD_PACKAGES[@]}"
 
+stage_start=$SECONDS
+stage() {
+  [ -n "${stage_name:-}" ] && echo "   ($stage_name: $((SECONDS - stage_start)) s)"
+  stage_name=$1 stage_start=$SECONDS
+  [ -n "$1" ] && echo "== $1"
+  return 0
+}
+
 for preset in native mingw64 mingw32; do
-  echo "== build $preset"
+  stage "build $preset"
   cmake --preset "$preset" >/dev/null
   cmake --build --preset "$preset" -j "$(karvel_jobs)"
 done
 
-echo "== 32-bit DLL imports"
+stage "32-bit DLL imports"
 scripts/check-imports.sh i686-w64-mingw32-objdump build/mingw32/bin/karvel.dll
 
 status=0
-echo "== native tests"
+stage "native tests"
 ctest --preset native || status=1
 
-echo "== Windows tests under Wine"
+stage "Windows tests under Wine"
 karvel_wine_env "$PWD/build/mingw64"
 xvfb-run -a -s "-screen 0 1280x1024x24" ctest --preset mingw64 || status=1
 wineserver -k 2>/dev/null || true
+
+stage "32-bit Windows tests under 32-bit Wine"
+rc=0
+scripts/test32.sh || rc=$?
+[ $rc -eq 0 ] || [ $rc -eq 3 ] || status=1  # 3: cannot run here, and it said why
+
+stage "Microsoft-ABI check"
+scripts/check-msabi.sh || status=1
+stage ""
 exit $status
