@@ -15,3 +15,7 @@
 #  define _InterlockedOr64 karvel_wine_InterlockedOr64
 #  define _InterlockedXor64 karvel_wine_InterlockedXor64
 #endif
+
+// GetGuiResources' selectors, missing from Wine's winuser.h.
+#define GR_GDIOBJECTS 0
+#define GR_USEROBJECTS 1
