@@ -3,10 +3,12 @@
 #include "convert/dor_shape.h"
 #include "model/dor_layout_check.h"
 
-KARVEL_FIELD(CDorGeometry, tag, KARVEL_PICK(4, 8));
-KARVEL_FIELD(CDorGeometry, kind, KARVEL_PICK(8, 12));
-KARVEL_FIELD(CDorGeometry, material, KARVEL_PICK(12, 16));
-KARVEL_FIELD(CDorGeometry, style, KARVEL_PICK(80, 84));
+// NOTE: Microsoft's 32-bit ABI pads the virtual table pointer to the class's alignment (8, for
+// its doubles); GCC's does not. The fields from textureScaleU on agree again.
+KARVEL_FIELD(CDorGeometry, tag, KARVEL_PICK_ABI(4, 8, 8, 8));
+KARVEL_FIELD(CDorGeometry, kind, KARVEL_PICK_ABI(8, 12, 12, 12));
+KARVEL_FIELD(CDorGeometry, material, KARVEL_PICK_ABI(12, 16, 16, 16));
+KARVEL_FIELD(CDorGeometry, style, KARVEL_PICK_ABI(80, 84, 84, 84));
 KARVEL_FIELD(CDorGeometry, textureScaleU, 88);
 KARVEL_FIELD(CDorGeometry, textureScaleV, 96);
 KARVEL_FIELD(CDorGeometry, texture, 104);

@@ -3,18 +3,17 @@
 # same files serve the viewer (through the DLL) and the test programs (through the static
 # library). Included by examples/ and tests/; whichever comes first defines it.
 if(NOT TARGET karvel_viewer_core)
-  # NOTE: nlohmann-json and stb are header-only Debian packages in /usr/include. A MinGW build
-  # must not search the rest of /usr/include, so it reaches them through links in the build tree.
-  find_path(KARVEL_NLOHMANN_INCLUDE nlohmann/json.hpp NO_CMAKE_FIND_ROOT_PATH)
-  find_path(KARVEL_STB_INCLUDE stb/stb_image_write.h NO_CMAKE_FIND_ROOT_PATH)
+  # NOTE: nlohmann-json and stb are header-only; Debian puts them in /usr/include, which a MinGW
+  # build must not search as a whole. Copies in the build tree keep them apart (copies, not
+  # links: links need extra rights on Windows).
   if(NOT KARVEL_NLOHMANN_INCLUDE OR NOT KARVEL_STB_INCLUDE)
     message(FATAL_ERROR "The viewer needs nlohmann/json.hpp and stb/stb_image_write.h "
                         "(Debian: nlohmann-json3-dev libstb-dev)")
   endif()
-  set(viewer_third_party ${CMAKE_BINARY_DIR}/third_party/include)
-  file(MAKE_DIRECTORY ${viewer_third_party})
-  file(CREATE_LINK ${KARVEL_NLOHMANN_INCLUDE}/nlohmann ${viewer_third_party}/nlohmann SYMBOLIC)
-  file(CREATE_LINK ${KARVEL_STB_INCLUDE}/stb ${viewer_third_party}/stb SYMBOLIC)
+  set(viewer_third_party ${CMAKE_BINARY_DIR}/third_party/headers)
+  file(COPY ${KARVEL_NLOHMANN_INCLUDE}/nlohmann DESTINATION ${viewer_third_party})
+  file(COPY ${KARVEL_STB_INCLUDE}/stb/stb_image_write.h ${KARVEL_STB_INCLUDE}/stb/stb_image.h
+       DESTINATION ${viewer_third_party}/stb)
 
   file(GLOB viewer_core_sources CONFIGURE_DEPENDS ${PROJECT_SOURCE_DIR}/examples/viewer/*.cpp)
   karvel_split_sources(viewer_core_portable viewer_core_windows ${viewer_core_sources})

@@ -28,6 +28,10 @@
 /// the offset work at any time.
 ///
 /// The order of the virtual operations is part of the binary interface: never reorder or insert.
+/// The /* n */ comments number declarations, not virtual table slots. Compilers lay slots out
+/// differently: Microsoft's puts overloads in reverse declaration order (Initialize(HDC&) comes
+/// before Initialize(HDC&, _VelViewport)) and gives the destructor one slot, GCC's two.
+/// scripts/msabi/CVelKarvel.vftable pins Microsoft's layout and scripts/check-msabi.sh checks it.
 /// The descriptions below are those of the OpenGL modeller, CVelGLKarvel, the one
 /// implementation; "Base:" says what CVelKarvel itself does for a modeller that does not
 /// override the operation.

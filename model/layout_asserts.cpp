@@ -1,10 +1,9 @@
 // The records' field order and widths are the library's binary interface: hosts built against
 // one release must be able to load another. Any change here is a breaking change.
-#include "camera/vel_camera.h"
-#include "gl/vel_karvel.h"
 #include "model/dor_layout_check.h"
 #include "model/dor_list.h"
 #include "model/dor_types.h"
+#include "model/platform.h"
 #include "model/vel_primitive.h"
 
 static_assert(sizeof(void*) == KARVEL_PICK(4, 8), "layout table does not match this target");
@@ -110,24 +109,6 @@ KARVEL_SIZE(CVelTrianglePolys, KARVEL_PICK(124, 144));
 
 KARVEL_FIELD(CVelPrimitive, groups, KARVEL_PICK(4, 8));
 KARVEL_FIELD(CVelPrimitive, DrawMode, KARVEL_PICK(20, 32));
-
-KARVEL_FIELD(_VelCamera, eye, 0);
-KARVEL_FIELD(_VelCamera, target, 32);
-KARVEL_FIELD(_VelCamera, fovy, 64);
-KARVEL_FIELD(_VelCamera, zNear, 72);
-KARVEL_FIELD(_VelCamera, zFar, 80);
-KARVEL_FIELD(_VelCamera, aspect, 88);
-KARVEL_SIZE(_VelCamera, 96);
-
-KARVEL_FIELD(_VelViewport, x, 0);
-KARVEL_FIELD(_VelViewport, y, 4);
-KARVEL_FIELD(_VelViewport, width, 8);
-KARVEL_FIELD(_VelViewport, height, 12);
-KARVEL_SIZE(_VelViewport, 16);
-
-KARVEL_FIELD(_VelSelect, position, 0);
-KARVEL_FIELD(_VelSelect, depth, 8);
-KARVEL_SIZE(_VelSelect, 16);
 
 #if defined(_WIN32)
 static_assert(sizeof(DorBitmapInfoHeader) == sizeof(BITMAPINFOHEADER), "info header differs from Windows'");

@@ -12,13 +12,18 @@ karvel_require_packages() {
   [ "$(id -u)" -eq 0 ] || sudo=(sudo)
   # NOTE: only 64-bit Wine is installable here (the i386 archive does not resolve), so never
   # add the i386 architecture.
-  "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get update -qq
-  "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq "${missing[@]}" >/dev/null
+  # NOTE: an unrelated broken index makes `apt-get update` fail for good; what matters is
+  # whether the packages install.
+  "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=600 update -qq ||
+    echo "apt-get update failed; installing from the package lists there are"
+  "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=600 install -y -qq "${missing[@]}" >/dev/null
 }
 
+# The Microsoft-ABI check (scripts/check-msabi.sh) needs clang-cl, libc++ and Wine's headers.
 KARVEL_BUILD_PACKAGES=(cmake make g++ binutils mingw-w64 binutils-mingw-w64-x86-64 binutils-mingw-w64-i686
                        wine wine64 xvfb xauth libosmesa6 googletest
-                       libbenchmark-dev nlohmann-json3-dev libstb-dev doxygen libglu1-mesa-dev)
+                       libbenchmark-dev nlohmann-json3-dev libstb-dev doxygen libglu1-mesa-dev
+                       clang-14 libc++-14-dev libwine-dev)
 
 # Creates the throwaway Wine prefix of a build tree once, so that tests do not race to make it.
 karvel_wine_env() {

@@ -20,6 +20,14 @@ const UINT RecordIntervalMs = 100;
 const int RecordFps = 10;
 const double GlideMs = 600.0;
 
+// NOTE: Wine (8.0) renders a GL child window but never shows it: the view stays black. It does
+// show an owned popup, so there the view is one, kept over the frame's client area.
+bool RunsOnWine()
+{
+    HMODULE ntdll = GetModuleHandleA("ntdll.dll");
+    return ntdll && GetProcAddress(ntdll, "wine_get_version");
+}
+
 class ViewerWindow {
 public:
     explicit ViewerWindow(Scene& scene) : scene_(scene) {}
@@ -33,6 +41,7 @@ private:
     Scene& scene_;
     HWND frame_ = nullptr;
     HWND status_ = nullptr;
+    bool popupView_ = RunsOnWine();
     std::unique_ptr<ModelView> view_;
     Drag drag_ = Drag::None;
     bool dragged_ = false;  // moved beyond a click
@@ -87,12 +96,18 @@ LRESULT CALLBACK ViewerWindow::FrameProc(HWND hwnd, UINT message, WPARAM wParam,
         case WM_SIZE:
             self->LayOut();
             return 0;
+        case WM_MOVE:
+            if (self->popupView_)
+                self->LayOut();
+            return 0;
         case WM_SETFOCUS:
             SetFocus(self->view_->hwnd);
             return 0;
         case WM_CLOSE:
             if (self->recorder_.IsStart())
                 self->ToggleRecording();
+            // An owned popup view is destroyed before its owner: the context goes first.
+            self->view_.reset();
             break;
         case WM_DESTROY:
             // The context goes while its window still exists (children are destroyed after this).
@@ -138,7 +153,7 @@ bool ViewerWindow::Create(int width, int height, const std::string& title)
     AdjustWindowRect(&outer, style, FALSE);
     SetWindowPos(frame_, nullptr, 0, 0, outer.right - outer.left, outer.bottom - outer.top, SWP_NOMOVE | SWP_NOZORDER);
 
-    HWND viewWindow = CreateViewWindow(frame_, width, height, &ViewerWindow::ViewMessage, this);
+    HWND viewWindow = CreateViewWindow(frame_, width, height, &ViewerWindow::ViewMessage, this, popupView_);
     if (!viewWindow)
         return false;
     view_ = std::make_unique<ModelView>(viewWindow);
@@ -146,6 +161,7 @@ bool ViewerWindow::Create(int width, int height, const std::string& title)
     if (!view_->Start(scene_))
         return false;
     ShowWindow(frame_, SW_SHOW);
+    ShowWindow(viewWindow, SW_SHOW);
     SetFocus(viewWindow);
     Status("Left drag orbits, right drag pans, wheel flies, shift+drag zooms (Esc resets), click picks, "
            "double-click approaches, F fits all, S snapshot, M movie");
@@ -176,7 +192,10 @@ void ViewerWindow::LayOut()
     GetClientRect(frame_, &client);
     GetWindowRect(status_, &bar);
     int height = client.bottom - (bar.bottom - bar.top);
-    MoveWindow(view_->hwnd, 0, 0, client.right, height > 1 ? height : 1, TRUE);
+    POINT origin = {0, 0};
+    if (popupView_)
+        ClientToScreen(frame_, &origin);  // a popup is placed in screen coordinates
+    MoveWindow(view_->hwnd, origin.x, origin.y, client.right, height > 1 ? height : 1, TRUE);
 }
 
 LRESULT ViewerWindow::OnViewMessage(HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam)

@@ -42,11 +42,12 @@ void RegisterViewClass()
 }
 }  // namespace
 
-HWND CreateViewWindow(HWND parent, int width, int height, ViewMessageHandler handler, void* owner)
+HWND CreateViewWindow(HWND parent, int width, int height, ViewMessageHandler handler, void* owner, bool ownedPopup)
 {
     RegisterViewClass();
     auto* hook = new ViewHook{handler, owner};
-    DWORD style = WS_CLIPCHILDREN | WS_CLIPSIBLINGS | (parent ? WS_CHILD | WS_VISIBLE : WS_OVERLAPPEDWINDOW);
+    DWORD kind = !parent ? WS_OVERLAPPEDWINDOW : ownedPopup ? WS_POPUP : WS_CHILD | WS_VISIBLE;
+    DWORD style = WS_CLIPCHILDREN | WS_CLIPSIBLINGS | kind;
     RECT r = {0, 0, width, height};
     AdjustWindowRect(&r, style, FALSE);
     HWND hwnd = CreateWindowA(ViewClassName, "karvel viewer", style, 0, 0, r.right - r.left, r.bottom - r.top, parent,

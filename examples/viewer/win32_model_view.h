@@ -14,9 +14,11 @@
 // Window procedure hook of a view window: the owner that gets its messages, or none.
 typedef LRESULT (*ViewMessageHandler)(void* owner, HWND hwnd, UINT message, WPARAM wParam, LPARAM lParam);
 
-// Creates a view window with its own DC: a child of parent when given, else a hidden top-level
-// window with that exact client size. Its messages go to handler(owner, ...) when set.
-HWND CreateViewWindow(HWND parent, int width, int height, ViewMessageHandler handler, void* owner);
+// Creates a view window with its own DC: a child of parent when given (with ownedPopup, a hidden
+// popup that parent owns instead), else a hidden top-level window with that exact client size.
+// Its messages go to handler(owner, ...) when set.
+HWND CreateViewWindow(HWND parent, int width, int height, ViewMessageHandler handler, void* owner,
+                      bool ownedPopup = false);
 
 class ModelView {
 public:
