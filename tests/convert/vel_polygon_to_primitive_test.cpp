@@ -72,8 +72,10 @@ TEST(FaceToPrimitive, SolidAndWireFrontAndBack)
             }
         }
         f.face->SetTexture(0);
-        for (int style : {2, -1})
-            EXPECT_EQ(ConvertFace(*(f.face->style = style, f.face), 0).GetSize(), 0);
+        for (int style : {2, -1}) {
+            f.face->style = style;
+            EXPECT_EQ(ConvertFace(*f.face, 0).GetSize(), 0);
+        }
     }
 }
 
