@@ -1,72 +1,54 @@
 #include "geometry_checks.h"
 #include "model/vel_primitive.h"
 
-TEST(ShapeClasses, KindsAndDefaultsAHostCanRelyOn)
+// What a host relies on without setting it: the kinds, solid untextured geometries in the
+// groups' own default material, both caps on.
+TEST(ShapeClasses, KindsAndDefaults)
 {
     CDorPolygon polygon;
     CDorHolePolygon holed;
-    CDorExtruded extruded;
-    EXPECT_EQ(extruded.kind, 7);
-    EXPECT_EQ(CDorHoleExtruded().kind, 8);
-    EXPECT_EQ(std::set<int>({polygon.kind, holed.kind, 7, 8}).size(), 4u);
-    EXPECT_EQ(polygon.style, DorStyleSolid);
-    EXPECT_EQ(polygon.texture, 0u);
-    EXPECT_EQ(polygon.textureScaleU, 1.0);
-    EXPECT_EQ(polygon.points.GetSize(), 0);
-    EXPECT_EQ(extruded.bottomCap, 1);
-    EXPECT_EQ(extruded.topCap, 1);
-    EXPECT_EQ(polygon.material.shininess, CVelTrianglePolys().material.shininess);
+    CDorExtruded extruded, prism(Polygon(Square(0, 0, 1)), DorVector3(0, 0, 1));
+    CDorHoleExtruded holedExtruded, holedPrism(HolePolygon(Square(0, 0, 1), {}), DorVector3(0, 0, 1));
+    EXPECT_TRUE(polygon.kind == 5 && holed.kind == 6 && extruded.kind == 7 && holedExtruded.kind == 8);
+    for (const CDorGeometry* g : std::vector<const CDorGeometry*>{&polygon, &holed, &extruded, &prism, &holedExtruded, &holedPrism})
+        EXPECT_TRUE(g->style == DorStyleSolid && g->texture == 0u && g->textureScaleU == 1.0 && g->textureScaleV == 1.0 &&
+                    g->material.shininess == CVelTrianglePolys().material.shininess && g->material.diffuse.r == 0.8f) << g->kind;
+    EXPECT_TRUE(extruded.bottomCap == 1 && extruded.topCap == 1 && prism.bottomCap == 1 && prism.topCap == 1);
+    EXPECT_TRUE(holedExtruded.bottomCap == 1 && holedExtruded.topCap == 1 && holedPrism.bottomCap == 1 && holedPrism.topCap == 1);
 }
 
-// Points and given texture points move up; a texture point not given stays not given.
-TEST(ShapeClasses, PrismFromOneProfile)
+// A prism's top is its profile moved up, holes and given texture points too; a texture point not
+// given stays not given. Copies are deep.
+TEST(ShapeClasses, PrismsFromOneProfileAndDeepCopies)
 {
-    CDorPolygon base({DorVector3(0, 0, 0), DorVector3(2, 0, 0), DorVector3(0, 2, 0)});
-    base.textureOrigin = DorVector3(1, 1, 0);
-    CDorExtruded prism(base, DorVector3(0, 0, 5));
-    ASSERT_EQ(prism.top.points.GetSize(), 3);
-    EXPECT_TRUE(SamePoint(prism.top.points[1], DorVector3(2, 0, 5)));
-    EXPECT_TRUE(SamePoint(prism.bottom.points[1], DorVector3(2, 0, 0)));
-    EXPECT_TRUE(SamePoint(prism.top.textureOrigin, DorVector3(1, 1, 5)));
-    EXPECT_TRUE(SamePoint(prism.top.textureAxis, DorVector3(0, 0, 0)));
-}
-
-TEST(ShapeClasses, CopiesAreDeepAndShapesDoNotOwnTheirGeometries)
-{
-    CDorHoleExtruded solid(HolePolygon(Square(0, 0, 4), {{DorVector3(1, 1, 0), DorVector3(2, 1, 0), DorVector3(2, 2, 0)}}), DorVector3(0, 0, 1));
+    CDorHolePolygon base = HolePolygon({DorVector3(0, 0, 0), DorVector3(4, 0, 0), DorVector3(0, 4, 0)}, {Square(1, 1, 1)});
+    base.textureOrigin = base.holeTextureAxis = DorVector3(1, 1, 0);
+    CDorHoleExtruded solid(base, DorVector3(0, 0, 5));
+    CDorExtruded plain(CDorPolygon(base.points.GetData(), 3), DorVector3(0, 0, 5));
+    for (const CDorArray<DorVector3, DorVector3&>* top : {&solid.top.points, &plain.top.points})
+        EXPECT_TRUE(top->GetSize() == 3 && SamePoint((*top)[1], DorVector3(4, 0, 5)));
+    EXPECT_TRUE(SamePoint(solid.top.holes[0].points[2], DorVector3(2, 2, 5)) && SamePoint(solid.bottom.points[1], DorVector3(4, 0, 0)));
+    EXPECT_TRUE(SamePoint(solid.top.textureOrigin, DorVector3(1, 1, 5)) && SamePoint(solid.top.holeTextureAxis, DorVector3(1, 1, 5)));
+    EXPECT_TRUE(SamePoint(solid.top.textureAxis, DorVector3()) && SamePoint(solid.top.holeTextureOrigin, DorVector3(0, 0, 5)));
+    EXPECT_TRUE(SamePoint(plain.top.textureAxis, DorVector3()) && SamePoint(plain.top.textureOrigin, DorVector3(0, 0, 5)));
     CDorHoleExtruded copy(solid), assigned;
     copy.bottom.holes[0].points[0].x = copy.bottom.points[0].x = 99;
-    EXPECT_EQ(solid.bottom.holes[0].points[0].x, 1.0);
-    EXPECT_EQ(solid.bottom.points[0].x, 0.0);
-    ASSERT_EQ(solid.top.holes.GetSize(), 1);
-    EXPECT_EQ(solid.top.holes[0].points[2].z, 1.0);
     assigned = solid;
-    EXPECT_EQ(assigned.top.holes[0].points.GetSize(), 3);
-
-    CDorExtruded a, b;
-    CDorShape shape;
-    shape.Add(&a);
-    shape.Add(&b);
-    CDorShape listed(shape);
-    shape.RemoveAll();
-    ASSERT_EQ(listed.GetCount(), 2);
-    _DorPosition* at = listed.geometries.GetHeadPosition();
-    EXPECT_EQ(CDorList::GetAt(at), static_cast<CDorGeometry*>(&a));
-    EXPECT_EQ(CDorList::GetAt(CDorList::GetNextPosition(at)), static_cast<CDorGeometry*>(&b));
+    EXPECT_TRUE(solid.bottom.holes[0].points[0].x == 1.0 && solid.bottom.points[0].x == 0.0 && assigned.top.holes[0].points.GetSize() == 4);
 }
 
 TEST(ShapeClasses, MatchCapsToWallsCopiesTheWallsLook)
 {
     CDorExtruded box(Polygon(LShape()), DorVector3(0, 0, 1));
-    box.material.shininess = 7;
-    box.SetTexture(3, 2.0, 4.0);
-    box.SetStyle(DorStyleWire);
-    box.MatchCapsToWalls();
-    for (const CDorPolygon* cap : {&box.bottom, &box.top}) {
-        EXPECT_EQ(cap->material.shininess, 7.0f);
-        EXPECT_EQ(cap->texture, 3u);
-        EXPECT_EQ(cap->textureScaleV, 4.0);
-        EXPECT_EQ(cap->style, DorStyleWire);
-        EXPECT_EQ(cap->kind, DorKindPolygon);
+    CDorHoleExtruded holed(HolePolygon(LShape(), {}), DorVector3(0, 0, 1));
+    for (CDorGeometry* head : std::vector<CDorGeometry*>{&box, &holed}) {
+        head->material.shininess = 7;
+        head->SetTexture(3, 2.0, 4.0);
+        head->SetStyle(DorStyleWire);
     }
+    box.MatchCapsToWalls();
+    holed.MatchCapsToWalls();
+    for (const CDorGeometry* cap : std::vector<const CDorGeometry*>{&box.bottom, &box.top, &holed.bottom, &holed.top})
+        EXPECT_TRUE(cap->material.shininess == 7.0f && cap->texture == 3u && cap->textureScaleU == 2.0 && cap->textureScaleV == 4.0 &&
+                    cap->style == DorStyleWire && (cap->kind == DorKindPolygon || cap->kind == DorKindHolePolygon));
 }

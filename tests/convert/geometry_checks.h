@@ -17,14 +17,9 @@
 using namespace convert_test;
 using namespace hole_test;
 
-typedef std::set<std::set<int>> TriangleSet;
-
 inline bool SamePoint(const DorVector3& a, const DorVector3& b) { return a.x == b.x && a.y == b.y && a.z == b.z; }
 
-inline bool Near(const DorVector3& v, double x, double y, double z, double tolerance = 1e-12)
-{
-    return std::fabs(v.x - x) <= tolerance && std::fabs(v.y - y) <= tolerance && std::fabs(v.z - z) <= tolerance;
-}
+inline bool Near(const DorVector3& a, const DorVector3& b, double tolerance = 1e-12) { return DorLength(a - b) <= tolerance; }
 
 inline DorVector3 UnitNormal(const Loop& loop)
 {
@@ -69,9 +64,9 @@ struct Mesh {
     Loop v;
     std::vector<int> i;
     int Count() const { return static_cast<int>(i.size()) / 3; }
-    TriangleSet Triangles() const
+    std::set<std::set<int>> Triangles() const
     {
-        TriangleSet set;
+        std::set<std::set<int>> set;
         for (size_t t = 0; t + 2 < i.size(); t += 3)
             set.insert({i[t], i[t + 1], i[t + 2]});
         return set;
@@ -122,14 +117,6 @@ inline std::string Layout(const CVelGroupArray& groups)
     return out;
 }
 
-inline TriangleSet FanFromZero(int triangles)
-{
-    TriangleSet fan;
-    for (int k = 1; k <= triangles; ++k)
-        fan.insert({0, k, k + 1});
-    return fan;
-}
-
 // Indices in range and every triangle strictly counter-clockwise about normal; returns the area.
 inline double CheckTriangles(const Mesh& m, const DorVector3& normal)
 {
@@ -149,28 +136,26 @@ inline double CheckTriangles(const Mesh& m, const DorVector3& normal)
     return area;
 }
 
-inline bool InsideFlatLoop(const DorVector3& p, const Loop& loop)
-{
-    std::vector<DorVector2> flat;
-    for (const DorVector3& q : loop)
-        flat.push_back(DorVector2(q.x, q.y));
-    return VelWindingInside(VelWindingAngle(DorVector2(p.x, p.y), flat.data(), static_cast<int>(flat.size())));
-}
-
 // CheckTriangles about the outline's normal, no triangle twice and, for an outline in z = 0,
 // no triangle centred outside the outline or in a hole; returns the area.
 inline double CheckRing(const Mesh& m, const Loop& outline, const std::vector<Loop>& holes = {})
 {
     double area = CheckTriangles(m, UnitNormal(outline));
     EXPECT_EQ(m.Triangles().size(), static_cast<size_t>(m.Count())) << "a triangle appears twice";
+    auto inside = [](const DorVector3& p, const Loop& loop) {
+        std::vector<DorVector2> flat;
+        for (const DorVector3& q : loop)
+            flat.push_back(DorVector2(q.x, q.y));
+        return VelWindingInside(VelWindingAngle(DorVector2(p.x, p.y), flat.data(), static_cast<int>(flat.size())));
+    };
     bool flat = true;
     for (const DorVector3& p : outline)
         flat = flat && p.z == 0;
     for (size_t t = 0; flat && area >= 0 && t + 2 < m.i.size(); t += 3) {
         DorVector3 centre = (m.v[m.i[t]] + m.v[m.i[t + 1]] + m.v[m.i[t + 2]]) * (1.0 / 3);
-        EXPECT_TRUE(InsideFlatLoop(centre, outline)) << "triangle " << t / 3 << " lies outside the outline";
+        EXPECT_TRUE(inside(centre, outline)) << "triangle " << t / 3 << " lies outside the outline";
         for (size_t h = 0; h < holes.size(); ++h)
-            EXPECT_FALSE(InsideFlatLoop(centre, holes[h])) << "triangle " << t / 3 << " lies in hole " << h;
+            EXPECT_FALSE(inside(centre, holes[h])) << "triangle " << t / 3 << " lies in hole " << h;
     }
     return area;
 }

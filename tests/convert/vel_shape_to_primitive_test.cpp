@@ -1,8 +1,10 @@
 #include "convert/vel_shape_to_primitive.h"
 #include "geometry_checks.h"
+#include "tests/support/recording_karvel.h"
 
 namespace {
-// Two boxes told apart by their walls' shininess: the first makes 6 groups, the second 4.
+// Two boxes told apart by their walls' shininess: the first makes 6 groups, the second, without
+// caps, 4.
 class TwoBoxes : public ::testing::Test {
 protected:
     void SetUp() override
@@ -11,12 +13,11 @@ protected:
         second.material.shininess = 2;
         second.bottomCap = second.topCap = 0;
     }
-    CVelPrimitive Convert(std::initializer_list<CDorGeometry*> geometries)
+    CVelPrimitive Convert(std::initializer_list<CDorGeometry*> geometries, CVelPrimitive primitive = CVelPrimitive())
     {
         CDorShape shape;
         for (CDorGeometry* g : geometries)
             shape.Add(g);
-        CVelPrimitive primitive;
         CVelShapeToPrimitive().ConvertShape(shape, primitive);
         return primitive;
     }
@@ -25,49 +26,49 @@ protected:
 };
 }  // namespace
 
-TEST_F(TwoBoxes, GroupsComeInListOrderAndNullEntriesAreSkipped)
+// Groups come in list order, appended as deep copies, the draw mode kept; null entries, unknown
+// styles, bare polygons and a geometry claiming a kind it is not give nothing.
+TEST_F(TwoBoxes, GroupsComeInListOrderAndOnlyWhatCannotBeConvertedIsDropped)
 {
     CVelPrimitive primitive = Convert({&first, nullptr, &second});
     ASSERT_EQ(primitive.groups.GetSize(), 6 + 4);
-    EXPECT_EQ(primitive.groups[0].material.shininess, 1.0f);
-    EXPECT_EQ(primitive.groups[6].material.shininess, 2.0f);
-    EXPECT_EQ(primitive.groups[6].vertices[0].position.x, 3.0);
-    EXPECT_EQ(primitive.DrawMode, 2);
-    second.SetStyle(DorStyleWire);
-    primitive = Convert({&first, &second});
-    ASSERT_EQ(primitive.groups.GetSize(), 6 + 6);
-    EXPECT_EQ(primitive.groups[6].GroupType, VelGroupLines);
-    EXPECT_EQ(primitive.groups[11].GroupType, VelGroupLineStrip);
-}
-
-// An unknown style, a bare polygon and a geometry claiming a kind it is not convert to nothing.
-TEST_F(TwoBoxes, OnlyTheGeometriesItCannotConvertAreDropped)
-{
+    EXPECT_TRUE(primitive.groups[3].material.shininess == 1.0f && primitive.groups[6].material.shininess == 2.0f);
+    EXPECT_TRUE(primitive.groups[6].vertices[0].position.x == 3.0 && primitive.DrawMode == 2);
+    primitive.DrawMode = 3;
+    primitive = Convert({&second}, Convert({&second}, primitive));
+    ASSERT_EQ(primitive.groups.GetSize(), 6 + 4 + 8);
+    primitive.groups[10].vertices[0].position.x = 99;
+    EXPECT_TRUE(primitive.groups[14].vertices[0].position.x == 3.0 && primitive.DrawMode == 3);
     first.SetStyle(5);
+    second.SetStyle(DorStyleWire);
     CDorPolygon square(first.bottom), liar(square);
     CDorHolePolygon holed(square);
     liar.kind = DorKindExtruded;
-    CVelPrimitive primitive = Convert({&first, &square, &holed, &liar, &second});
-    ASSERT_EQ(primitive.groups.GetSize(), 4);
-    EXPECT_EQ(primitive.groups[0].material.shininess, 2.0f);
+    EXPECT_EQ(Layout(Convert({&first, &square, &holed, &liar, &second}).groups), "L4 L4 L4 L4 S5 S5");
+    CVelGroupArray groups;
+    CVelShapeToPrimitive().ConvertGeometry(nullptr, groups);
+    CVelShapeToPrimitive().ConvertGeometry(&liar, groups);
+    EXPECT_EQ(groups.GetSize(), 0);
 }
 
-TEST_F(TwoBoxes, ConvertingAppendsDeepCopiesAndKeepsDrawMode)
+// The modeller stores each converted shape as a new entity and reconverts on a change with every
+// change flag; ShapeToPrimitive only converts.
+TEST_F(TwoBoxes, TheModellerStoresAndReplacesConvertedShapes)
 {
-    CDorShape shape;
+    RecordingKarvel modeller;
+    CDorShape shape, empty;
+    shape.Add(&first);
     shape.Add(&second);
+    _DorPosition* entity = modeller.AddShape(shape);
+    _DorPosition* nothing = modeller.AddShape(empty);
+    ASSERT_TRUE(entity != nothing && modeller.entities.count(entity) == 1u && modeller.entities.count(nothing) == 1u);
+    EXPECT_TRUE(modeller.entities[entity].groups.GetSize() == 10 && modeller.entities[nothing].groups.GetSize() == 0);
+    second.top = second.bottom.Translated(DorVector3(0, 0, 7));
+    modeller.ChangeShape(entity, shape);
+    EXPECT_EQ(modeller.lastChangeFlags, 31);
+    EXPECT_EQ(modeller.entities[entity].groups[6].vertices[0].position.z, 7.0);  // the second box's first wall, top first
     CVelPrimitive primitive;
-    primitive.DrawMode = 3;
-    CVelShapeToPrimitive converter;
-    converter.ConvertShape(shape, primitive);
-    converter.ConvertShape(shape, primitive);
-    converter.ConvertShape(CDorShape(), primitive);
-    ASSERT_EQ(primitive.groups.GetSize(), 8);
-    EXPECT_EQ(primitive.DrawMode, 3);
-    primitive.groups[0].vertices[0].position.x = 99;
-    EXPECT_EQ(primitive.groups[4].vertices[0].position.x, 3.0);
-    CVelGroupArray groups;
-    converter.ConvertGeometry(&second, groups);
-    converter.ConvertGeometry(nullptr, groups);
-    EXPECT_EQ(groups.GetSize(), 4);
+    primitive.groups.SetSize(2);
+    modeller.ShapeToPrimitive(shape, primitive);
+    EXPECT_TRUE(primitive.groups.GetSize() == 2 + 10 && modeller.entities.size() == 2u);
 }

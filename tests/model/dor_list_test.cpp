@@ -14,7 +14,9 @@ std::vector<int> Contents(const CDorList& list)
 }
 }  // namespace
 
-TEST(DorList, HandlesStayValidWhileOthersAreRemovedAndFreedNodesAreReusedFirst)
+// Handles are node addresses: a block hands its nodes out in order, other handles survive a
+// removal, the last freed node is reused first and the last removal frees every block.
+TEST(DorList, HandlesStayValidFreedNodesAreReusedFirstAndTheLastRemovalFreesTheBlocks)
 {
     int v[25];
     CDorList list;
@@ -23,9 +25,7 @@ TEST(DorList, HandlesStayValidWhileOthersAreRemovedAndFreedNodesAreReusedFirst)
         v[i] = i;
         handle[i] = list.AddTail(&v[i]);
     }
-    // A block hands its nodes out in order.
-    EXPECT_EQ(reinterpret_cast<char*>(handle[1]) - reinterpret_cast<char*>(handle[0]),
-              static_cast<long>(sizeof(CDorList::Node)));
+    EXPECT_EQ(reinterpret_cast<char*>(handle[1]) - reinterpret_cast<char*>(handle[0]), static_cast<long>(sizeof(CDorList::Node)));
     for (int i = 0; i < 25; i += 2)
         list.RemoveAt(handle[i]);
     list.RemoveAt(nullptr);
@@ -34,20 +34,13 @@ TEST(DorList, HandlesStayValidWhileOthersAreRemovedAndFreedNodesAreReusedFirst)
         EXPECT_EQ(CDorList::GetAt(handle[i]), &v[i]);
     EXPECT_EQ(Contents(list), (std::vector<int>{1, 3, 5, 7, 9, 11, 13, 15, 17, 19, 21, 23}));
     EXPECT_EQ(list.AddTail(&v[0]), handle[24]);
-}
-
-TEST(DorList, LastRemovalFreesEveryBlock)
-{
-    int a = 1, b = 2;
-    CDorList list;
-    _DorPosition* ha = list.AddTail(&a);
-    _DorPosition* hb = list.AddTail(&b);
-    list.RemoveAt(ha);
+    for (int i = 0; i < 23; i += 2)
+        list.RemoveAt(i ? handle[i - 1] : handle[24]);
     EXPECT_NE(list.blocks, nullptr);
-    list.RemoveAt(hb);
+    list.RemoveAt(handle[23]);
     EXPECT_TRUE(list.blocks == nullptr && list.freeList == nullptr && list.head == nullptr && list.tail == nullptr);
-    list.AddTail(&a);
-    EXPECT_EQ(Contents(list), std::vector<int>{1});
+    list.AddTail(&v[3]);
+    EXPECT_EQ(Contents(list), std::vector<int>{3});
 }
 
 TEST(DorList, MovingToHeadOrTailWritesTheHandleBackAndCopiesKeepOrder)
@@ -66,10 +59,8 @@ TEST(DorList, MovingToHeadOrTailWritesTheHandleBackAndCopiesKeepOrder)
     EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1, 3, 0}));
     copy = CDorList();
     EXPECT_EQ(copy.GetCount(), 0);
-
     CDorList single;
     _DorPosition* only = single.AddTail(&v[1]);
     single.MoveToHead(only);  // frees every block on the way: the handle must be the new one
-    EXPECT_EQ(single.GetHeadPosition(), only);
-    EXPECT_EQ(CDorList::GetAt(only), &v[1]);
+    EXPECT_TRUE(single.GetHeadPosition() == only && CDorList::GetAt(only) == &v[1]);
 }
