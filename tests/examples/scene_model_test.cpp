@@ -1,18 +1,16 @@
 #include <gtest/gtest.h>
 
+#include <stdexcept>
+
 #include "scene.h"
 #include "scene_model.h"
 #include "support/recording_karvel.h"
 #include "viewer_test_support.h"
 
-using viewer_test::BmpFile;
-using viewer_test::ScratchDir;
-
 namespace {
-// Hands out texture names from firstName on (0 = refused), keeps lights and background.
+// Hands out texture names from 7 on (0 = refused), keeps lights and background.
 class SceneKarvel : public RecordingKarvel {
 public:
-    unsigned int firstName = 7;
     bool refuseTextures = false;
     std::vector<int> textureWidths;
     std::vector<std::pair<int, DorLight>> lights;
@@ -23,7 +21,7 @@ public:
         if (refuseTextures)
             return 0;
         textureWidths.push_back(bitmap.info.width);
-        return firstName + static_cast<unsigned int>(textureWidths.size()) - 1;
+        return 6 + static_cast<unsigned int>(textureWidths.size());
     }
     void SetLight(int index, DorLight light) override { lights.push_back({index, light}); }
     void SetBkColor(DorColorValue& colour) override { background = colour; }
@@ -32,14 +30,14 @@ public:
 // A textured box, a plain grid and a line, with a light and a grey background.
 class TexturedBoxScene : public ::testing::Test {
 protected:
-    ScratchDir dir{"scene_model_test"};
+    viewer_test::ScratchDir dir{"scene_model_test"};
     Scene scene;
     SceneKarvel modeller;
     SceneNames names;
 
     void SetUp() override
     {
-        dir.Write("tiles.bmp", BmpFile(8, 8, 24));
+        dir.Write("tiles.bmp", viewer_test::BmpFile(8, 8, 24));
         dir.Write("scene.json", std::string(R"({"background": [0.5, 0.5, 0.5],
             "camera": {"eye": [5, -5, 5], "target": [0, 0, 0], "fovy": 40},
             "lights": [{"index": 1, "type": "directional", "direction": [1, 1, -1]}],
@@ -57,50 +55,38 @@ protected:
         for (auto& entry : names)
             if (entry.second == name)
                 return modeller.entities.at(const_cast<_DorPosition*>(entry.first));
-        ADD_FAILURE() << "no entity " << name;
-        return modeller.entities.begin()->second;
+        throw std::runtime_error("no entity " + name);
     }
 };
 }  // namespace
 
+// Walls and caps carry the texture name the modeller gave, or none when it refused the texture.
 TEST_F(TexturedBoxScene, EveryEntityIsAddedUnderItsNameWithItsTexture)
 {
-    AddSceneEntities(modeller, scene, AddSceneTextures(modeller, scene), names);
-    ASSERT_EQ(names.size(), 3u);
-    ASSERT_EQ(modeller.entities.size(), 3u);
-    EXPECT_EQ(EntityNamed("box").groups.GetSize(), 6);  // four walls and two caps
-    EXPECT_EQ(EntityNamed("ground").groups[0].GroupType, VelGroupLines);
-    EXPECT_EQ(EntityNamed("axis").groups[0].vertices.GetSize(), 2);
-    // Walls and caps carry the texture name the modeller gave.
-    ASSERT_EQ(modeller.textureWidths, std::vector<int>{8});
-    const CVelPrimitive& box = EntityNamed("box");
-    for (int g = 0; g < box.groups.GetSize(); ++g) {
-        EXPECT_EQ(box.groups[g].texture, 7u) << g;
-        EXPECT_EQ(box.groups[g].RenderKind, VelRenderTextured) << g;
+    for (bool refuse : {false, true}) {
+        modeller.refuseTextures = refuse;
+        modeller.entities.clear();
+        names.clear();
+        AddSceneEntities(modeller, scene, AddSceneTextures(modeller, scene), names);
+        ASSERT_TRUE(names.size() == 3u && modeller.entities.size() == 3u);
+        const CVelPrimitive& box = EntityNamed("box");
+        ASSERT_EQ(box.groups.GetSize(), 6);  // four walls and two caps
+        for (int g = 0; g < box.groups.GetSize(); ++g) {
+            EXPECT_EQ(box.groups[g].texture, refuse ? 0u : 7u) << g;
+            EXPECT_EQ(box.groups[g].RenderKind, refuse ? VelRenderLit : VelRenderTextured) << g;
+        }
+        EXPECT_TRUE(EntityNamed("ground").groups[0].GroupType == VelGroupLines && EntityNamed("ground").groups[0].texture == 0u);
+        EXPECT_EQ(EntityNamed("axis").groups[0].vertices.GetSize(), 2);
     }
-    EXPECT_EQ(EntityNamed("ground").groups[0].texture, 0u);
-}
-
-TEST_F(TexturedBoxScene, ARefusedTextureLeavesTheBoxPlain)
-{
-    modeller.refuseTextures = true;
-    AddSceneEntities(modeller, scene, AddSceneTextures(modeller, scene), names);
-    const CVelPrimitive& box = EntityNamed("box");
-    ASSERT_EQ(box.groups.GetSize(), 6);
-    for (int g = 0; g < box.groups.GetSize(); ++g)
-        EXPECT_EQ(box.groups[g].RenderKind, VelRenderLit) << g;
+    EXPECT_EQ(modeller.textureWidths, std::vector<int>{8});
 }
 
 TEST_F(TexturedBoxScene, ViewKeepsTheWindowsAspectRatio)
 {
     modeller.camera.aspect = 1.6;
     ApplySceneView(modeller, scene);
-    EXPECT_DOUBLE_EQ(modeller.camera.eye.x, 5.0);
-    EXPECT_DOUBLE_EQ(modeller.camera.fovy, 40.0);
-    EXPECT_DOUBLE_EQ(modeller.camera.aspect, 1.6);
+    EXPECT_TRUE(modeller.camera.eye.x == 5.0 && modeller.camera.fovy == 40.0 && modeller.camera.aspect == 1.6);
     ASSERT_EQ(modeller.lights.size(), 1u);
-    EXPECT_EQ(modeller.lights[0].first, 1);
-    EXPECT_DOUBLE_EQ(modeller.lights[0].second.direction.x, 1.0);
-    EXPECT_FLOAT_EQ(modeller.background.r, 0.5f);
-    EXPECT_FLOAT_EQ(modeller.background.a, 1.0f);
+    EXPECT_TRUE(modeller.lights[0].first == 1 && modeller.lights[0].second.direction.x == 1.0);
+    EXPECT_TRUE(modeller.background.r == 0.5f && modeller.background.a == 1.0f);
 }
