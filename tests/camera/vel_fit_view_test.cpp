@@ -9,38 +9,29 @@
 #include "support/recording_karvel.h"
 
 namespace {
-// How far the box reaches toward the edge of the view (1 = touching, above 1 = outside), and the
-// nearest and farthest corner depths.
-struct Reach {
-    double edge, nearest, farthest;
-};
-
-Reach ReachOf(const _VelCamera& camera, const DorVector3& low, const DorVector3& high)
+// How far the box reaches toward the edge of the view (1 = touching, above 1 = outside), and
+// whether every corner lies between the clip planes.
+double ReachOf(const _VelCamera& camera, const DorVector3& low, const DorVector3& high, bool& clipped)
 {
     DorMatrix4x4 view;
     CVelMathMatrix::GetToViewMatrix(camera, 0, view);
-    double t = std::tan(camera.fovy / 2 / 180 * DorPi);
-    Reach r = {0, HUGE_VAL, -HUGE_VAL};
+    const double t = std::tan(camera.fovy / 360 * DorPi);
+    double edge = 0;
     for (int i = 0; i < 8; ++i) {
         DorVector3 v = DorTransformPoint(DorVector3((i & 1 ? high : low).x, (i & 2 ? high : low).y, (i & 4 ? high : low).z), view);
-        r.edge = std::max({r.edge, std::fabs(v.x) / (-v.z * t * camera.aspect), std::fabs(v.y) / (-v.z * t)});
-        r.nearest = std::min(r.nearest, -v.z);
-        r.farthest = std::max(r.farthest, -v.z);
+        edge = std::max({edge, std::fabs(v.x) / (-v.z * t * camera.aspect), std::fabs(v.y) / (-v.z * t)});
+        clipped = clipped || -v.z <= camera.zNear || -v.z >= camera.zFar;
     }
-    return r;
+    return edge;
 }
 
-DorVector3 Direction(const _VelCamera& c)
-{
-    DorVector3 d = c.target - c.eye;
-    DorNormalize(d);
-    return d;
-}
+DorVector3 Direction(const _VelCamera& c) { return (c.target - c.eye) * (1 / DorLength(c.target - c.eye)); }
 }  // namespace
 
 // Both fits keep the direction, the field of view and zNear, aim at the box centre and leave every
 // corner inside the view and between the clip planes; the box fit comes no farther back than the
-// sphere fit and touches the edge unless the near plane holds it back.
+// sphere fit and touches the edge unless the near plane holds it back. The sphere touches the
+// narrower field of view.
 TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
 {
     const DorVector3 slabLow(10, -4, 2), slabHigh(70, 6, 5), aim(40, 1, 10), cube(10, 10, 10), o(0, 0, 0);
@@ -48,39 +39,30 @@ TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
         DorVector3 eye, target;
         double fovy, aspect, zNear;
         DorVector3 low, high;
-        bool touches;
         double sphereDistance;  // 0: not pinned
     } rows[] = {
-        // A long flat slab off the origin from several directions (the last straight down).
-        {{0, -100, 30}, aim, 45, 4.0 / 3.0, 1, slabLow, slabHigh, true, 0},
-        {{-50, 20, -40}, aim, 45, 0.5, 1, slabLow, slabHigh, true, 0},
-        {{300, 300, 300}, aim, 45, 2.5, 1, slabLow, slabHigh, true, 0},
-        {{40, 1, 300}, aim, 45, 2.0, 1, slabLow, slabHigh, true, 0},
-        // A cube: the sphere around it touches the narrower field of view.
-        {{0, -50, 0}, o, 90, 0.5, 1, cube * -1.0, cube, true, std::sqrt(300.0) / std::sin(std::atan(0.5))},
-        {{0, -50, 0}, o, 90, 2.0, 1, cube * -1.0, cube, true, std::sqrt(300.0) / std::sin(DorPi / 4)},
-        // A tiny box beyond a far-out near plane; a huge one that pushes the far plane out.
-        {{0, -50, 0}, o, 60, 1, 5, o, {0.01, 0.01, 0.01}, false, 0},
-        {{0, -50, 10}, o, 45, 1, 1, {-50000, -50000, 0}, {50000, 50000, 100}, true, 0},
+        {{0, -100, 30}, aim, 45, 0.5, 1, slabLow, slabHigh, 0},  // a long flat slab off the origin, from the side
+        {{40, 1, 300}, aim, 45, 2.0, 1, slabLow, slabHigh, 0},   // and from straight above
+        {{0, -50, 0}, o, 90, 0.5, 1, cube * -1.0, cube, std::sqrt(300.0) / std::sin(std::atan(0.5))},
+        {{0, -50, 0}, o, 90, 2.0, 1, cube * -1.0, cube, std::sqrt(300.0) / std::sin(DorPi / 4)},
+        {{0, -50, 0}, o, 60, 1, 5, o, {0.01, 0.01, 0.01}, 0},  // a tiny box beyond a far-out near plane
+        {{0, -50, 10}, o, 45, 1, 1, {-50000, -50000, 0}, {50000, 50000, 100}, 0},  // a huge one: zFar moves out
     };
     for (const auto& row : rows) {
         SCOPED_TRACE(::testing::Message() << "eye " << row.eye.x << "," << row.eye.y << "," << row.eye.z);
-        _VelCamera start = Camera(row.eye, row.target, row.fovy, row.aspect);
+        _VelCamera start = Camera(row.eye, row.target, row.fovy, row.aspect), sphere, box;
         start.zNear = row.zNear;
-        _VelCamera sphere = start, box = start;
-        CVelMathCamera::FitViewToSphere(sphere, row.low, row.high);
-        CVelMathCamera::FitViewToBox(box, row.low, row.high);
+        CVelMathCamera::FitViewToSphere(sphere = start, row.low, row.high);
+        CVelMathCamera::FitViewToBox(box = start, row.low, row.high);
         for (const _VelCamera* c : {&sphere, &box}) {
-            Reach r = ReachOf(*c, row.low, row.high);
-            EXPECT_LE(r.edge, c == &sphere ? 1.0 : 1.0 + 1e-9);
-            EXPECT_TRUE(r.nearest > row.zNear && r.farthest < c->zFar);
-            EXPECT_LE(DorLength(c->target - (row.low + row.high) * 0.5), 1e-12);
-            EXPECT_LE(DorLength(Direction(*c) - Direction(start)), 1e-12);
-            EXPECT_TRUE(c->fovy == row.fovy && c->zNear == row.zNear);
+            bool clipped = false;
+            EXPECT_LE(ReachOf(*c, row.low, row.high, clipped), c == &sphere ? 1.0 : 1.0 + 1e-9);
+            EXPECT_TRUE(!clipped && DorLength(c->target - (row.low + row.high) * 0.5) <= 1e-12);
+            EXPECT_TRUE(DorLength(Direction(*c) - Direction(start)) <= 1e-12 && c->fovy == row.fovy && c->zNear == row.zNear);
         }
-        const double boxEdge = ReachOf(box, row.low, row.high).edge;
-        EXPECT_TRUE(row.touches ? std::fabs(boxEdge - 1.0) <= 1e-9 : boxEdge < 1.0) << boxEdge;
-        const double sphereDistance = DorLength(sphere.target - sphere.eye);
+        bool clipped = false;
+        const double boxEdge = ReachOf(box, row.low, row.high, clipped), sphereDistance = DorLength(sphere.target - sphere.eye);
+        EXPECT_TRUE(row.zNear > 1 ? boxEdge < 1.0 : std::fabs(boxEdge - 1.0) <= 1e-9) << boxEdge;
         EXPECT_LE(DorLength(box.target - box.eye), sphereDistance + 1e-9);
         EXPECT_TRUE(row.sphereDistance == 0 || std::fabs(sphereDistance - row.sphereDistance) <= 1e-9);
     }
@@ -90,11 +72,10 @@ TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
 // outside 0..180 degrees is not fitted at all.
 TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
 {
-    _VelCamera c = Camera(DorVector3(0, -30, 0), DorVector3(0, 10, 0), 45, 1);
-    CVelMathCamera::FitViewToBox(c, DorVector3(5, 5, 5), DorVector3(5, 5, 5));
-    EXPECT_NEAR(DorLength(c.target - c.eye), 40, 1e-9);
-    EXPECT_TRUE(c.target.x == 5 && c.target.z == 5);
-    const DorVector3 o(0, 0, 0), south(0, -5, 0), one(1, 1, 1);
+    const DorVector3 o(0, 0, 0), south(0, -30, 0), one(1, 1, 1);
+    _VelCamera c = Camera(south, DorVector3(0, 10, 0), 45, 1);
+    CVelMathCamera::FitViewToBox(c, one * 5, one * 5);
+    EXPECT_TRUE(std::fabs(DorLength(c.target - c.eye) - 40) < 1e-9 && c.target.x == 5 && c.target.z == 5);
     for (const _VelCamera& before : {Camera(south, o, 0, 1), Camera(south, o, 180, 1), Camera(one, one, 45, 1), Camera(south, o, NAN, 1)}) {
         c = before;
         CVelMathCamera::FitViewToSphere(c, one * -1.0, one);
@@ -118,28 +99,22 @@ public:
     void ResetViewport() override { viewport = {0, 0, 640, 480}; }
 };
 
-// The glide's easing is pinned by the animation tests; here only where it starts and ends.
+// The glide starts at the camera and ends exactly on the fit; nothing is drawn when the fit leaves
+// the camera where it was; the viewport variant resets a zoom before fitting.
 TEST(AllModelView, GlidesFromTheCameraToTheFitAndEndsExactlyOnIt)
 {
-    FittingKarvel k;
+    FittingKarvel k, still, zoomed;
     std::vector<_VelCamera> drawn;
     k.onDraw = [&] { drawn.push_back(k.camera); };
     k.KarvelAllmodelView(nullptr, 0, 40);
     ASSERT_GE(drawn.size(), 2u);
     EXPECT_LT(drawn.front().eye.x, 25);  // nearer the start (0) than the fit (50)
     EXPECT_TRUE(SameCameraBits(drawn.back(), k.fitted) && SameCameraBits(k.camera, k.fitted));
-}
-
-TEST(AllModelView, NothingToFitDrawsNothingAndTheViewportVariantResetsBeforeFitting)
-{
-    FittingKarvel k;
-    k.fits = false;
-    k.KarvelAllmodelView(nullptr, 0, 1000);
-    EXPECT_EQ(k.drawCalls, 0);
-    k.fits = true;
-    k.viewport = {-200, -150, 800, 600};  // zoomed
-    k.KarvelAllmodelView_vp(nullptr, 0, 0);
-    EXPECT_EQ(k.setViewportCalls, 1);
-    EXPECT_TRUE(k.viewportAtFit.x == 0 && k.viewportAtFit.width == 640 && k.camera.eye.z == 50);
-    EXPECT_EQ(k.drawCalls, 1);  // no glide for duration 0, one frame on the fit
+    still.fits = false;
+    still.KarvelAllmodelView(nullptr, 0, 1000);
+    EXPECT_EQ(still.drawCalls, 0);
+    zoomed.viewport = {-200, -150, 800, 600};
+    zoomed.KarvelAllmodelView_vp(nullptr, 0, 0);
+    EXPECT_TRUE(zoomed.setViewportCalls == 1 && zoomed.viewportAtFit.x == 0 && zoomed.viewportAtFit.width == 640);
+    EXPECT_TRUE(zoomed.camera.eye.z == 50 && zoomed.drawCalls == 1);  // no glide for duration 0, one frame on the fit
 }

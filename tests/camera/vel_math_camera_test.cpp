@@ -8,8 +8,7 @@
 #include "support/camera_bits.h"
 
 namespace {
-const double kNaN = std::numeric_limits<double>::quiet_NaN(), kInf = std::numeric_limits<double>::infinity();
-const double kH = std::sqrt(0.5);
+const double kNaN = std::numeric_limits<double>::quiet_NaN(), kInf = std::numeric_limits<double>::infinity(), kH = std::sqrt(0.5);
 
 enum Op { Pan, Dolly, Fly, Round };
 void Apply(_VelCamera& c, Op op, double a, double b, double d, int eyeOnly)
@@ -23,7 +22,7 @@ void Apply(_VelCamera& c, Op op, double a, double b, double d, int eyeOnly)
 }
 }  // namespace
 
-TEST(ToViewMatrix, HandDerivedImages)
+TEST(ViewMatrices, HandDerivedImages)
 {
     const struct {
         DorVector3 eye, target;
@@ -41,19 +40,11 @@ TEST(ToViewMatrix, HandDerivedImages)
         CVelMathMatrix::GetToViewMatrix(Camera(r.eye, r.target), r.dist, view);
         EXPECT_LE(DorLength(DorTransformPoint(r.point, view) - r.image), 1e-12) << r.point.x << r.point.y << r.point.z;
     }
-}
-
-TEST(PerspectiveMatrix, UpperEdgeOfTheFieldOfViewMapsToOneAndZeroDistGivesNaNDepth)
-{
-    // fovy 90: half-angle tangent 1; measured from the plane 5 ahead of the eye.
+    // fovy 90 seen from the plane 5 ahead: the top edge maps to y = 1; dist 0 gives NaN depth.
     DorMatrix4x4 m;
     CVelMathMatrix::GetPerspectiveMatrix(Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0), 90.0), 5.0, m);
-    const DorVector3 points[] = {DorVector3(0, 13, 8), DorVector3(-4, 13, 0)}, images[] = {{0, 1, 3.0 / 8}, {-0.5, 0, 3.0 / 8}};
-    for (int i = 0; i < 2; ++i) {
-        const DorVector3& p = points[i];
-        double w = p.x * m.m[0][3] + p.y * m.m[1][3] + p.z * m.m[2][3] + m.m[3][3];
-        EXPECT_LE(DorLength(DorTransformPoint(p, m) * (1.0 / w) - images[i]), 1e-12) << i;
-    }
+    const DorVector3 p(-4, 13, 8);
+    EXPECT_LE(DorLength(DorTransformPoint(p, m) * (1 / (p.y * m.m[1][3] + p.z * m.m[2][3] + m.m[3][3])) - DorVector3(-0.5, 1, 0.375)), 1e-12);
     CVelMathMatrix::GetPerspectiveMatrix(Camera(DorVector3(1, 2, 3), DorVector3(4, 10, 5)), 0.0, m);
     for (int row = 0; row < 4; ++row)
         EXPECT_TRUE(std::isnan(m.m[row][2]) && std::isnan(m.m[row][3]) && std::isfinite(m.m[row][0] + m.m[row][1]));
@@ -86,6 +77,11 @@ TEST(Moves, HandDerivedResultsAndRefusals)
         {{0, 0, 0}, {5, 0, 0}, Pan, 0, -90, 0, 0, {0, 0, 0}, {5, 0, 0}, 0},
         {{0, -1, 1}, {0, 0, 0}, Round, 45, 10, 0, 0, {0, -1, 1}, {0, 0, 0}, 0},
         {{1e308, 0, 0}, {1e308, 5, 0}, Dolly, 0, -1e308, 0, 0, {1e308, 0, 0}, {1e308, 5, 0}, 0},
+        // Vertical or too short views have no direction to move along.
+        {{0, 0, 5}, {0, 0, -5}, Dolly, 1, 1, 1, 0, {0, 0, 5}, {0, 0, -5}, 0},
+        {{0, 0, 5}, {0, 0, -5}, Fly, 1, 1, 1, 0, {0, 0, 5}, {0, 0, -5}, 0},
+        {{0, 0, 5}, {0, 0, -5}, Pan, 10, 10, 0, 0, {0, 0, 5}, {0, 0, -5}, 0},
+        {{1, 1, 1}, {1, 1, 1.00005}, Round, 10, 10, 0, 0, {1, 1, 1}, {1, 1, 1.00005}, 0},
     };
     for (int i = 0; i < static_cast<int>(sizeof rows / sizeof rows[0]); ++i) {
         _VelCamera c = Camera(rows[i].eye, rows[i].target), want = Camera(rows[i].eyeAfter, rows[i].targetAfter);
@@ -95,19 +91,6 @@ TEST(Moves, HandDerivedResultsAndRefusals)
                                       : SameCameraBits(c, want))
             << "row " << i;
     }
-}
-
-TEST(Moves, VerticalShortOrNonFiniteViewsRefuseEveryMove)
-{
-    _VelCamera nanAspect = Camera(DorVector3(0, 0, 0), DorVector3(1, 0, 0));
-    nanAspect.aspect = kNaN;
-    for (const _VelCamera& original : {Camera(DorVector3(0, 0, 5), DorVector3(0, 0, -5)),
-                                       Camera(DorVector3(1, 1, 1), DorVector3(1, 1, 1.00005)), nanAspect})
-        for (Op op : {Pan, Dolly, Fly, Round}) {
-            _VelCamera c = original;
-            Apply(c, op, 10, 10, 1, 0);
-            EXPECT_TRUE(SameCameraBits(c, original)) << op;
-        }
 }
 
 TEST(ViewportZoom, FitsTheDraggedBoxWithinFiveTimes)
@@ -164,28 +147,4 @@ TEST(ApproachCamera, TurnsToHalfThePointedOffsetOrMovesByTheGrowthFactor)
     _VelCamera c = nanFovy;
     CVelMathCamera::ApproachCamera(c, DorVector2(10, 10), 200, 100, 0);
     EXPECT_TRUE(SameCameraBits(c, nanFovy));
-}
-
-// Extreme numbers in every slot: each operation leaves the camera as it was or entirely finite,
-// and never crashes (the sanitizers watch the conversions).
-TEST(Moves, ExtremeInputsNeverStoreANonFiniteCamera)
-{
-    const double values[] = {0.0, -0.0, 1e-300, 3.0, -7.5, 1e300, -1e308, kInf, -kInf, kNaN};
-    const int n = sizeof values / sizeof values[0];
-    for (int i = 0; i < n * n; ++i) {
-        const double e = values[i / n], t = values[i % n], a = values[(i / n + i) % n], b = values[(i / n * 3 + i) % n];
-        const _VelCamera original = Camera(DorVector3(e, 1, 2), DorVector3(4, t, -1));
-        for (int op = 0; op < 6; ++op) {
-            _VelCamera c = original;
-            if (op < 4)
-                Apply(c, static_cast<Op>(op), a, b, a, i & 1);
-            else if (op == 4)
-                CVelMathCamera::ApproachCamera(c, DorVector2(a, b), 300, 150, 0);
-            else
-                CVelMathCamera::ApproachCamera(c, DorVector2(1, 2), a, b, t);
-            EXPECT_TRUE(SameCameraBits(c, original) || VelCameraIsFinite(c)) << op << " " << i;
-            _VelViewport v = {i * 100 - 2000, 0, 400, 300};
-            CVelMathCamera::ViewportZoom(c, v, DorVector2(a, b), DorVector2(b, a));
-        }
-    }
 }
