@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <fstream>
 #include <iterator>
 
@@ -16,46 +15,36 @@ const std::string kSource = KARVEL_SOURCE_DIR;
 template <class Polygon>  // plain or holed
 void ExpectOutwardAndMoved(const Polygon& bottom, const Polygon& top, const DorVector3& by)
 {
-    const int n = bottom.points.GetSize();
-    ASSERT_EQ(top.points.GetSize(), n);
-    EXPECT_GT(DorDot(DorNewellNormal(bottom.points.GetData(), n), by), 0.0);
-    for (int i = 0; i < n; ++i)
+    ASSERT_EQ(top.points.GetSize(), bottom.points.GetSize());
+    EXPECT_GT(DorDot(DorNewellNormal(bottom.points.GetData(), bottom.points.GetSize()), by), 0.0);
+    for (int i = 0; i < bottom.points.GetSize(); ++i)
         EXPECT_LE(DorLength(top.points[i] - bottom.points[i] - by), 1e-12) << i;
 }
 }  // namespace
 
 // A slab given clockwise about its extrusion is turned round keeping point 0; a wall's holes run
-// the outline's way round and move to the top with it; colours give the ambient, parts override.
+// the outline's way round and move to the top with it; a colour gives the ambient; each texture
+// file is read once and shared.
 TEST(SceneFile, EntitiesLightsAndCameraAreRead)
 {
     viewer_test::ScratchDir dir("scene_file_test");
     dir.Write("tiles.bmp", viewer_test::BmpFile(16, 16, 24));
-    dir.Write("wood.bmp", viewer_test::BmpFile(8, 4, 32));
     Scene scene;
     std::string error;
-    ASSERT_TRUE(ParseScene(R"({"background": [0.2, 0.3, 0.4],
-        "camera": {"eye": [1, 2, 3], "target": [4, 5, 6], "fovy": 30, "near": 0.5, "far": 80},
-        "lights": [{"index": 2, "type": "directional", "direction": [0, 0, -2]},
-                   {"index": 3, "type": "positional", "position": [1, 1, 9], "enabled": false, "attenuation": 0.1}],
+    ASSERT_TRUE(ParseScene(R"({"background": [0.2, 0.3, 0.4], "camera": {"eye": [1, 2, 3], "target": [4, 5, 6], "fovy": 30, "far": 80},
+        "lights": [{"index": 3, "type": "positional", "position": [1, 1, 9], "enabled": false, "attenuation": 0.1}],
         "entities": [
           {"name": "slab", "type": "extrusion", "style": "wire", "caps": {"bottom": false}, "material": {"color": [1, 0, 0]},
            "profile": [[0, 0, 0], [1, 0, 0], [1, 0, 1], [0, 0, 1]], "extrude": [0, 2, 0],
            "texture": {"file": "tiles.bmp", "scale": [2, 0.5], "axis": [0, 0, 1], "capAxis": [1, 0, 0]}},
-          {"name": "wall", "type": "extrusion", "profile": [[0, 0, 0], [6, 0, 0], [6, 0, 3], [0, 0, 3]],
+          {"name": "wall", "type": "extrusion", "profile": [[0, 0, 0], [6, 0, 0], [6, 0, 3], [0, 0, 3]], "extrude": [0, 0.25, 0],
            "holes": [[[1, 0, 0.1], [1, 0, 2.1], [2, 0, 2.1], [2, 0, 0.1]], [[3, 0, 1], [5, 0, 1], [5, 0, 2], [3, 0, 2]]],
-           "extrude": [0, 0.25, 0], "material": {"color": [0, 0, 1, 0.5], "ambient": [0.1, 0.2, 0.3], "shininess": 100},
-           "texture": {"file": "wood.bmp"}},
-          {"name": "boss", "type": "extrusion", "profile": {"center": [1, 2, 3], "radius": 0.5, "segments": 24}, "extrude": [0, 0, 1],
-           "texture": {"file": "tiles.bmp"}},
-          {"name": "x axis", "type": "line", "from": [0, 0, 0], "to": [5, 0, 0], "material": {"color": [1, 0, 0]}, "width": 3},
-          {"name": "ground", "type": "grid", "from": [-5, -5], "to": [5, 5], "divisions": 10}]})",
+           "material": {"color": [0, 0, 1, 0.5], "ambient": [0.1, 0.2, 0.3]}, "texture": {"file": "tiles.bmp"}},
+          {"name": "x axis", "type": "line", "from": [0, 0, 0], "to": [5, 0, 0], "material": {"color": [1, 0, 0]}, "width": 3}]})",
                            "test.json", dir.Base(), scene, error)) << error;
-    EXPECT_TRUE(scene.background.g == 0.3f && scene.background.a == 1.0f);
-    EXPECT_TRUE(scene.camera.eye.y == 2.0 && scene.camera.fovy == 30.0 && scene.camera.zNear == 0.5 && scene.camera.zFar == 80.0);
-    ASSERT_EQ(scene.lights.size(), 2u);
-    const DorLight &directional = scene.lights[0].light, &positional = scene.lights[1].light;
-    EXPECT_TRUE(scene.lights[0].index == 2 && directional.type == 1 && directional.enabled == 1 && directional.direction.z == -2.0);
-    EXPECT_TRUE(positional.type == 0 && positional.enabled == 0 && positional.attenuation == 0.1f && positional.position.z == 9);
+    EXPECT_TRUE(scene.background.g == 0.3f && scene.camera.eye.y == 2.0 && scene.camera.fovy == 30.0 && scene.camera.zFar == 80.0);
+    const SceneLight& light = scene.lights.at(0);
+    EXPECT_TRUE(light.index == 3 && light.light.type == 0 && light.light.enabled == 0 && light.light.attenuation == 0.1f);
 
     const CDorExtruded& slab = dynamic_cast<const CDorExtruded&>(*scene.entities[0]->geometry);
     ExpectOutwardAndMoved(slab.bottom, slab.top, DorVector3(0, 2, 0));
@@ -70,20 +59,11 @@ TEST(SceneFile, EntitiesLightsAndCameraAreRead)
     ASSERT_TRUE(wall.bottom.holes.GetSize() == 2 && wall.top.holes.GetSize() == 2);
     for (int h = 0; h < 2; ++h)
         ExpectOutwardAndMoved(wall.bottom.holes[h], wall.top.holes[h], DorVector3(0, 0.25, 0));
-    EXPECT_TRUE(wall.material.diffuse.a == 0.5f && wall.material.ambient.g == 0.2f && wall.material.shininess == 100.0f);
-    const CDorExtruded& boss = dynamic_cast<const CDorExtruded&>(*scene.entities[2]->geometry);
-    ExpectOutwardAndMoved(boss.bottom, boss.top, DorVector3(0, 0, 1));
-    for (int i = 0; i < 24; ++i)  // an even polygon on the circle
-        EXPECT_NEAR(DorLength(boss.bottom.points[i] - DorVector3(1, 2, 3)) + DorLength(boss.bottom.points[i] - boss.bottom.points[(i + 1) % 24]),
-                    0.5 + std::sin(DorPi / 24), 1e-12) << i;
-
-    ASSERT_EQ(scene.textures.size(), 2u);  // each file read once
-    EXPECT_TRUE(scene.entities[0]->texture == 0 && scene.entities[1]->texture == 1 && scene.entities[2]->texture == 0);
-    EXPECT_TRUE(scene.textures[1]->bitmap.info.bitCount == 32 && scene.entities[3]->texture == -1);
-    const CVelTrianglePolys& line = scene.entities[3]->primitive.groups[0];
+    EXPECT_TRUE(wall.material.diffuse.a == 0.5f && wall.material.ambient.g == 0.2f);
+    EXPECT_TRUE(scene.textures.size() == 1u && scene.entities[1]->texture == 0 && scene.entities[2]->texture == -1);
+    const CVelTrianglePolys& line = scene.entities[2]->primitive.groups[0];
     EXPECT_TRUE(line.GroupType == VelGroupLines && line.vertices[1].position.x == 5.0 && line.lineWidth == 3.0f);
     EXPECT_TRUE(line.material.ambient.r == 1.0f && line.material.diffuse.r == 0.8f);  // lines show their ambient colour
-    EXPECT_TRUE(scene.entities[4]->primitive.groups[0].vertices.GetSize() == 4 * 11 && scene.entities[4]->primitive.DrawMode == 2);
 }
 
 // Each kind of mistake names the file, the place and what was expected, with what was found.
@@ -91,8 +71,8 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
 {
     viewer_test::ScratchDir dir("scene_file_test");
     dir.Write("odd.bmp", viewer_test::BmpFile(3, 5, 24));
-    const std::string camera = R"({"camera": {"eye": [10, -10, 5], "target": [0, 0, 0]}, )";
-    const std::string w = R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]])", scene = camera + R"("entities": [)";
+    const std::string w = R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]])";
+    const std::string scene = R"({"camera": {"eye": [10, -10, 5], "target": [0, 0, 0]}, "entities": [)";
     const struct {
         std::string text, message;  // message without the leading "test.json: "
     } cases[] = {
@@ -100,7 +80,6 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
         {scene + w + "}]}", "entities[0] (\"w\"): expected \"extrude\" (the vector from the profile to the top face) or \"top\" (the top profile)"},
         {scene + R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,"a"],[0,1,0]], "extrude": [0,0,1]}]})",
          "entities[0] (\"w\").profile[1][2]: expected a number, found the string \"a\""},
-        {camera + R"("background": [1, 0.5, 2], "entities": []})", "background[2]: expected a number from 0 to 1, found the number 2"},
         {scene + R"({"name": "g", "type": "grid", "from": [0, 0], "to": [1, 1], "divisions": 2.5}]})",
          "entities[0] (\"g\").divisions: expected a whole number from 1 to 10000, found the number 2.5"},
         {scene + w + R"(, "extrude": [0,0,1]},)" + w + R"(, "extrude": [0,0,1]}]})", "entities[1] (\"w\").name: expected a name not used before (entities[0] has it)"},
@@ -139,7 +118,7 @@ TEST(SceneFile, ShippedScenesAndTheDocumentedExampleLoadAndConvert)
     int holed = 0;
     for (Scene& scene : scenes)
         for (auto& entity : scene.entities) {
-            holed += dynamic_cast<CDorHoleExtruded*>(entity->geometry.get()) != nullptr && &scene == &scenes[0];
+            holed += &scene == &scenes[0] && dynamic_cast<CDorHoleExtruded*>(entity->geometry.get()) != nullptr;
             CVelPrimitive primitive = entity->primitive;
             CDorShape shape;
             if (entity->geometry) {

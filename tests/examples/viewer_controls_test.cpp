@@ -10,8 +10,8 @@
 
 // Looking along +y from 20 units away (90 degrees, 200 pixels high: 5 pixels a unit at the target).
 // Dragging right turns the model right (the eye goes left), dragging down shows its top; a pan
-// keeps the old target under the cursor; a whole orbit movie comes back to the start.
-TEST(ViewerControls, OrbitsAndPansFollowTheDrag)
+// keeps the old target under the cursor; the wheel flies a tenth of the distance per notch.
+TEST(ViewerControls, OrbitsPansAndWheelFollowTheMouse)
 {
     const double s = 20 * std::sin(DorPi / 9), c = 20 * std::cos(DorPi / 9);
     const struct {
@@ -26,22 +26,8 @@ TEST(ViewerControls, OrbitsAndPansFollowTheDrag)
         r.pan ? CVelMathCamera::Fly(camera, 0.0, pan.right, pan.up, 0) : CVelMathCamera::RoundDolly(camera, orbit.elevation, orbit.azimuth);
         EXPECT_LE(DorLength(camera.eye - r.eye) + DorLength(camera.target - r.target), 1e-9) << r.dx << "," << r.dy;
     }
-    EXPECT_TRUE(PanForDrag(30, 10, Camera(DorVector3(0, -20, 0), DorVector3(0, 0, 0)), 0).right == 0.0);
-    for (int frames : {1, 7, 72}) {
-        _VelCamera camera = Camera(DorVector3(0, -20, 8), DorVector3(0, 0, 0));
-        for (int i = 0; i < frames; ++i)
-            CVelMathCamera::RoundDolly(camera, 0.0, OrbitFrameAzimuth(frames));
-        EXPECT_LE(DorLength(camera.eye - DorVector3(0, -20, 8)), 1e-9) << frames;
-    }
-}
-
-// Click tolerance, wheel notches (a tenth of the distance each), rubber-band corners top-left first.
-TEST(ViewerControls, ClicksWheelAndRubberBand)
-{
-    EXPECT_TRUE(IsClick(100, 100, 102, 98) && !IsClick(100, 100, 103, 100) && !IsClick(100, 100, 100, 97));
     const _VelCamera camera = Camera(DorVector3(0, -20, 0), DorVector3(0, 0, 0));
     EXPECT_EQ((std::vector<double>{FlyForWheel(120, camera), FlyForWheel(-240, camera), FlyForWheel(60, camera)}), (std::vector<double>{2, -4, 1}));
-    DorVector2 a, b;
-    ZoomCorners(300, 50, 100, 250, a, b);
-    EXPECT_EQ((std::vector<double>{a.x, a.y, b.x, b.y}), (std::vector<double>{100, 50, 300, 250}));
+    EXPECT_TRUE(PanForDrag(30, 10, camera, 0).right == 0.0);
+    EXPECT_TRUE(IsClick(100, 100, 102, 98) && !IsClick(100, 100, 103, 100) && !IsClick(100, 100, 100, 97));
 }
