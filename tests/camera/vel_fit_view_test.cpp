@@ -3,7 +3,9 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <chrono>
 #include <cmath>
+#include <thread>
 
 #include "camera/vel_math_camera.h"
 #include "support/recording_karvel.h"
@@ -84,37 +86,38 @@ TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
     }
 }
 
-// A modeller whose fit moves the camera to a known place, and whose reset viewport is known.
+// A modeller whose fit moves the camera to a known place.
 class FittingKarvel : public RecordingKarvel {
 public:
     _VelCamera fitted = Camera(DorVector3(50, -50, 50), DorVector3(5, 5, 5));
-    bool fits = true;
-    _VelViewport viewportAtFit = {0, 0, 0, 0};
-    void SetCameraForAllView_Hi(int) override
-    {
-        viewportAtFit = viewport;
-        if (fits)
-            SetCamera(fitted);
-    }
-    void ResetViewport() override { viewport = {0, 0, 640, 480}; }
+    void SetCameraForAllView_Hi(int) override { SetCamera(fitted); }
 };
 
-// The glide starts at the camera and ends exactly on the fit; nothing is drawn when the fit leaves
-// the camera where it was; the viewport variant resets a zoom before fitting.
+// The glide eases out from the camera to the fit over the whole duration, eye and target moving
+// along their lines, never back and never all the way, then lands exactly on the fit; nothing is
+// drawn for a bad duration, and non-finite frames are drawn but never set. (Where the fit lands,
+// and the viewport variant, are checked on the live modeller.)
 TEST(AllModelView, GlidesFromTheCameraToTheFitAndEndsExactlyOnIt)
 {
-    FittingKarvel k, still, zoomed;
-    std::vector<_VelCamera> drawn;
-    k.onDraw = [&] { drawn.push_back(k.camera); };
+    FittingKarvel k, still;
+    std::vector<double> eased;
+    k.onDraw = [&] {
+        const double f = DorLength(k.camera.eye) / DorLength(k.fitted.eye);  // from an eye at the origin
+        const DorVector3 target = DorVector3(0, 10, 0) + (k.fitted.target - DorVector3(0, 10, 0)) * f;
+        EXPECT_LE(DorLength(k.camera.eye - k.fitted.eye * f) + DorLength(k.camera.target - target), 1e-9);
+        eased.push_back(f);
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    };
+    const auto start = std::chrono::steady_clock::now();
     k.KarvelAllmodelView(nullptr, 0, 40);
-    ASSERT_GE(drawn.size(), 2u);
-    EXPECT_LT(drawn.front().eye.x, 25);  // nearer the start (0) than the fit (50)
-    EXPECT_TRUE(SameCameraBits(drawn.back(), k.fitted) && SameCameraBits(k.camera, k.fitted));
-    still.fits = false;
-    still.KarvelAllmodelView(nullptr, 0, 1000);
+    EXPECT_GE(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(38));  // whole-ms clock
+    ASSERT_GE(eased.size(), 3u);
+    EXPECT_TRUE(std::is_sorted(eased.begin(), eased.end() - 1) && eased.front() < 0.5 && eased[eased.size() - 2] < 1);
+    EXPECT_TRUE(SameCameraBits(k.camera, k.fitted) && eased.back() == 1.0 && k.setCameraCalls == static_cast<int>(eased.size()) + 1);
+    for (double duration : {0.0, -5.0, double(NAN), HUGE_VAL})
+        CVelMathCamera::AnimationCamera_Sec(&still, still.camera, k.fitted, duration, nullptr);
     EXPECT_EQ(still.drawCalls, 0);
-    zoomed.viewport = {-200, -150, 800, 600};
-    zoomed.KarvelAllmodelView_vp(nullptr, 0, 0);
-    EXPECT_TRUE(zoomed.setViewportCalls == 1 && zoomed.viewportAtFit.x == 0 && zoomed.viewportAtFit.width == 640);
-    EXPECT_TRUE(zoomed.camera.eye.z == 50 && zoomed.drawCalls == 1);  // no glide for duration 0, one frame on the fit
+    still.fitted.eye.x = HUGE_VAL;
+    still.AnimationCamera(still.camera, still.fitted, 10.0, nullptr);  // the member glides its own modeller
+    EXPECT_TRUE(still.drawCalls > 0 && still.setCameraCalls == 0);
 }

@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include "convert/dor_shape.h"
-#include "movie/vfw_math_movie.h"
 #include "tests/support/recording_karvel.h"
 
 // A host's own modeller, derived from the exported interface: the members inside the DLL call
@@ -22,15 +21,4 @@ TEST(KarvelDll, MembersCallBackIntoAHostModellerAndItKeepsTheirPrimitives)
     const CVelPrimitive copy = host.entities[host.AddShape(shape)];
     ASSERT_EQ(copy.groups.GetSize(), 4 + 3 + 2);  // the kind check recognises the host's object
     EXPECT_EQ(copy.groups[8].triangles.GetSize(), 7);
-}
-
-TEST(KarvelDll, RecordersAreExported)
-{
-    _DorBitmap frame;
-    frame.info.width = frame.info.height = 4;
-    frame.bits.SetSize(48);
-    CVelMathMovie_NoComp plain;
-    CVelMathMovie compressed;
-    EXPECT_EQ(plain.Start(frame, "Z:\\no\\such\\folder\\movie.avi", 10, "m", 1) + compressed.Start(frame, "Z:\\no\\such\\folder\\movie.avi", 10, "m", 1), 0);
-    EXPECT_EQ(plain.IsStart() + compressed.IsStart(), 0);
 }

@@ -1,10 +1,9 @@
-// BMP textures read and PNG rows written by the viewer.
+// BMP textures read by the viewer.
 #include <gtest/gtest.h>
 
 #include <cstdlib>
 
 #include "bmp_file.h"
-#include "png_file.h"
 #include "viewer_test_support.h"
 
 using viewer_test::BmpFile;
@@ -15,7 +14,7 @@ TEST(BmpFile, PixelsAreReadBottomUpAtTheirStride)
 {
     const struct {
         int width, height, bitCount, stride;
-    } cases[] = {{33, 17, 24, 100}, {4, -4, 32, 16}, {3, 2, 24, 12}};
+    } cases[] = {{33, 17, 24, 100}, {4, -4, 32, 16}};
     for (const auto& c : cases) {
         _DorBitmap bitmap;
         std::string expected;
@@ -55,17 +54,4 @@ TEST(BmpFile, RefusalsSayWhatTheFileShouldHaveBeen)
         EXPECT_FALSE(DecodeBmp(std::vector<unsigned char>(file.begin(), file.begin() + n), bitmap, expected)) << n;
         EXPECT_TRUE(n + 1 == file.size() ? expected.find("cut short") != std::string::npos : !expected.empty()) << n << ": " << expected;
     }
-}
-
-// PNG rows run top first, red first, unpadded; only whole 24-bit bitmaps convert.
-TEST(PngFile, RgbRowsRunTopFirst)
-{
-    _DorBitmap bitmap;
-    std::string ignored;
-    ASSERT_TRUE(DecodeBmp(BmpFile(3, 2, 24), bitmap, ignored));
-    EXPECT_EQ(BitmapToRgbRows(bitmap), (std::vector<unsigned char>{200, 1, 0, 200, 1, 1, 200, 1, 2, 200, 0, 0, 200, 0, 1, 200, 0, 2}));
-    bitmap.bits.SetSize(bitmap.bits.GetSize() - 1);
-    EXPECT_TRUE(BitmapToRgbRows(bitmap).empty());
-    bitmap.info.bitCount = 32;
-    EXPECT_TRUE(BitmapToRgbRows(bitmap).empty());
 }

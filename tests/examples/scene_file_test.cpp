@@ -3,9 +3,10 @@
 #include <fstream>
 #include <iterator>
 
-#include "convert/vel_shape_to_primitive.h"
 #include "model/dor_math.h"
 #include "scene.h"
+#include "scene_model.h"
+#include "support/recording_karvel.h"
 #include "viewer_test_support.h"
 
 namespace {
@@ -23,9 +24,10 @@ void ExpectOutwardAndMoved(const Polygon& bottom, const Polygon& top, const DorV
 }  // namespace
 
 // A slab given clockwise about its extrusion is turned round keeping point 0; a wall's holes run
-// the outline's way round and move to the top with it; a colour gives the ambient; each texture
+// the outline's way round and move to the top with it; a colour gives the ambient; the caps'
+// texture axis is a point beside each cap's first point, moving with the profile; each texture
 // file is read once and shared.
-TEST(SceneFile, EntitiesLightsAndCameraAreRead)
+TEST(SceneFile, ExtrusionsLightsAndCameraAreRead)
 {
     viewer_test::ScratchDir dir("scene_file_test");
     dir.Write("tiles.bmp", viewer_test::BmpFile(16, 16, 24));
@@ -35,35 +37,25 @@ TEST(SceneFile, EntitiesLightsAndCameraAreRead)
         "lights": [{"index": 3, "type": "positional", "position": [1, 1, 9], "enabled": false, "attenuation": 0.1}],
         "entities": [
           {"name": "slab", "type": "extrusion", "style": "wire", "caps": {"bottom": false}, "material": {"color": [1, 0, 0]},
-           "profile": [[0, 0, 0], [1, 0, 0], [1, 0, 1], [0, 0, 1]], "extrude": [0, 2, 0],
-           "texture": {"file": "tiles.bmp", "scale": [2, 0.5], "axis": [0, 0, 1], "capAxis": [1, 0, 0]}},
+           "profile": [[0, 0, 0], [1, 0, 0], [1, 0, 1], [0, 0, 1]], "extrude": [0, 2, 0], "texture": {"file": "tiles.bmp", "capAxis": [1, 0, 0]}},
           {"name": "wall", "type": "extrusion", "profile": [[0, 0, 0], [6, 0, 0], [6, 0, 3], [0, 0, 3]], "extrude": [0, 0.25, 0],
            "holes": [[[1, 0, 0.1], [1, 0, 2.1], [2, 0, 2.1], [2, 0, 0.1]], [[3, 0, 1], [5, 0, 1], [5, 0, 2], [3, 0, 2]]],
-           "material": {"color": [0, 0, 1, 0.5], "ambient": [0.1, 0.2, 0.3]}, "texture": {"file": "tiles.bmp"}},
-          {"name": "x axis", "type": "line", "from": [0, 0, 0], "to": [5, 0, 0], "material": {"color": [1, 0, 0]}, "width": 3}]})",
-                           "test.json", dir.Base(), scene, error)) << error;
+           "texture": {"file": "tiles.bmp"}}]})", "test.json", dir.Base(), scene, error)) << error;
     EXPECT_TRUE(scene.background.g == 0.3f && scene.camera.eye.y == 2.0 && scene.camera.fovy == 30.0 && scene.camera.zFar == 80.0);
     const SceneLight& light = scene.lights.at(0);
     EXPECT_TRUE(light.index == 3 && light.light.type == 0 && light.light.enabled == 0 && light.light.attenuation == 0.1f);
-
     const CDorExtruded& slab = dynamic_cast<const CDorExtruded&>(*scene.entities[0]->geometry);
     ExpectOutwardAndMoved(slab.bottom, slab.top, DorVector3(0, 2, 0));
     EXPECT_TRUE(slab.bottom.points[0].x == 0 && slab.bottom.points[1].z == 1);  // (0, 0, 1) now follows point 0
     EXPECT_TRUE(slab.bottomCap == 0 && slab.topCap == 1 && slab.style == DorStyleWire && slab.top.style == DorStyleWire);
     EXPECT_TRUE(slab.material.diffuse.r == 1.0f && slab.material.ambient.r == 0.4f && slab.top.material.diffuse.g == 0.0f);
-    // The caps' texture axis is a point beside each cap's first point, moving with the profile.
-    EXPECT_TRUE(slab.textureScaleU == 2.0 && slab.top.textureScaleV == 0.5 && slab.textureAxis.z == 1.0);
     EXPECT_TRUE(DorLength(slab.bottom.textureAxis - DorVector3(1, 0, 0)) + DorLength(slab.top.textureAxis - DorVector3(1, 2, 0)) < 1e-12);
     const CDorHoleExtruded& wall = dynamic_cast<const CDorHoleExtruded&>(*scene.entities[1]->geometry);
     ExpectOutwardAndMoved(wall.bottom, wall.top, DorVector3(0, 0.25, 0));
     ASSERT_TRUE(wall.bottom.holes.GetSize() == 2 && wall.top.holes.GetSize() == 2);
     for (int h = 0; h < 2; ++h)
         ExpectOutwardAndMoved(wall.bottom.holes[h], wall.top.holes[h], DorVector3(0, 0.25, 0));
-    EXPECT_TRUE(wall.material.diffuse.a == 0.5f && wall.material.ambient.g == 0.2f);
-    EXPECT_TRUE(scene.textures.size() == 1u && scene.entities[1]->texture == 0 && scene.entities[2]->texture == -1);
-    const CVelTrianglePolys& line = scene.entities[2]->primitive.groups[0];
-    EXPECT_TRUE(line.GroupType == VelGroupLines && line.vertices[1].position.x == 5.0 && line.lineWidth == 3.0f);
-    EXPECT_TRUE(line.material.ambient.r == 1.0f && line.material.diffuse.r == 0.8f);  // lines show their ambient colour
+    EXPECT_TRUE(scene.textures.size() == 1u && scene.entities[1]->texture == 0);
 }
 
 // Each kind of mistake names the file, the place and what was expected, with what was found.
@@ -77,11 +69,10 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
         std::string text, message;  // message without the leading "test.json: "
     } cases[] = {
         {R"({"entities": []})", "top level: expected \"camera\" (the camera object)"},
+        {"{\n  \"camera\": {\"eye\": [0, 0, 1],,\n}", "line 2, column "},  // then what JSON expected there
         {scene + w + "}]}", "entities[0] (\"w\"): expected \"extrude\" (the vector from the profile to the top face) or \"top\" (the top profile)"},
         {scene + R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,"a"],[0,1,0]], "extrude": [0,0,1]}]})",
          "entities[0] (\"w\").profile[1][2]: expected a number, found the string \"a\""},
-        {scene + R"({"name": "g", "type": "grid", "from": [0, 0], "to": [1, 1], "divisions": 2.5}]})",
-         "entities[0] (\"g\").divisions: expected a whole number from 1 to 10000, found the number 2.5"},
         {scene + w + R"(, "extrude": [0,0,1]},)" + w + R"(, "extrude": [0,0,1]}]})", "entities[1] (\"w\").name: expected a name not used before (entities[0] has it)"},
         {scene + w + R"(, "extrud": [0,0,1]}]})", "entities[0] (\"w\").extrud: expected one of the keys \"name\", \"type\", \"profile\", \"holes\", \"extrude\", \"top\", \"caps\", \"style\", \"material\", \"texture\""},
         {scene + w + R"(, "extrude": [0,0,1], "texture": {"file": "odd.bmp"}}]})",
@@ -91,19 +82,30 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
         Scene fresh;
         std::string error;
         EXPECT_FALSE(ParseScene(c.text, "test.json", dir.Base(), fresh, error)) << c.text;
-        EXPECT_EQ(error, "test.json: " + c.message) << c.text;
+        EXPECT_EQ(error.substr(0, c.message.size() + 11), "test.json: " + c.message) << c.text;
     }
     Scene fresh;
     std::string error;
-    EXPECT_FALSE(ParseScene("{\n  \"camera\": {\"eye\": [0, 0, 1],,\n}", "test.json", dir.Base(), fresh, error));
-    EXPECT_TRUE(error.rfind("test.json: line 2, column ", 0) == 0 && error.find("expected valid JSON") != std::string::npos) << error;
     EXPECT_FALSE(LoadSceneFile(dir.Path("absent.json"), fresh, error));
     EXPECT_EQ(error, dir.Path("absent.json") + ": expected a readable scene file");
 }
 
-// The scenes shipped with the viewer, and the complete example of the format's documentation, load
-// and every entity converts to groups that all have vertices.
-TEST(SceneFile, ShippedScenesAndTheDocumentedExampleLoadAndConvert)
+// Hands out texture name 7 (0 when refusing), keeps lights and background.
+class SceneKarvel : public RecordingKarvel {
+public:
+    bool refuse = false;
+    std::vector<int> lights;
+    DorColorValue background;
+    unsigned int AddTexture(_DorBitmap&) override { return refuse ? 0 : 7; }
+    void SetLight(int index, DorLight) override { lights.push_back(index); }
+    void SetBkColor(DorColorValue& colour) override { background = colour; }
+};
+
+// The scenes shipped with the viewer and the documented example load, and every entity converts
+// to groups that all have vertices. Added to a modeller, every group of the house's floor, walls
+// and caps alike, carries the texture name it gave, or none when it refused the texture; the view
+// keeps the window's aspect ratio.
+TEST(SceneFile, ShippedScenesLoadConvertAndReachAModeller)
 {
     Scene scenes[3];
     std::string error;
@@ -112,22 +114,25 @@ TEST(SceneFile, ShippedScenesAndTheDocumentedExampleLoadAndConvert)
     std::ifstream doc(kSource + "/docs/scene-format.md");
     std::string text((std::istreambuf_iterator<char>(doc)), std::istreambuf_iterator<char>());
     size_t begin = text.find("```json\n") + 8;
-    ASSERT_GT(begin, 8u);
-    ASSERT_TRUE(ParseScene(text.substr(begin, text.find("```", begin) - begin), "scene-format.md", kSource + "/examples/scenes/", scenes[2], error)) << error;
-    EXPECT_TRUE(scenes[0].textures.size() == 1u && scenes[2].entities.size() == 5u);
-    int holed = 0;
+    ASSERT_TRUE(begin > 8 && ParseScene(text.substr(begin, text.find("```", begin) - begin), "scene-format.md", kSource + "/examples/scenes/", scenes[2], error)) << error;
     for (Scene& scene : scenes)
-        for (auto& entity : scene.entities) {
-            holed += &scene == &scenes[0] && dynamic_cast<CDorHoleExtruded*>(entity->geometry.get()) != nullptr;
-            CVelPrimitive primitive = entity->primitive;
-            CDorShape shape;
-            if (entity->geometry) {
-                shape.Add(entity->geometry.get());
-                CVelShapeToPrimitive().ConvertShape(shape, primitive);
+        for (bool refuse : {false, true}) {
+            SceneKarvel k;
+            k.refuse = refuse;
+            SceneNames names;
+            AddSceneEntities(k, scene, AddSceneTextures(k, scene), names);
+            ASSERT_TRUE(names.size() == scene.entities.size() && k.entities.size() == names.size());
+            for (auto& entry : names) {
+                const CVelPrimitive& p = k.entities.at(const_cast<_DorPosition*>(entry.first));
+                const bool textured = entry.second == "tiled floor" && !refuse;
+                EXPECT_GT(p.groups.GetSize(), entry.second == "tiled floor" ? 5 : 0) << entry.second;  // four walls and two caps
+                for (int g = 0; g < p.groups.GetSize(); ++g)
+                    EXPECT_TRUE(p.groups[g].vertices.GetSize() > 0 && (&scene != &scenes[0] || (p.groups[g].texture == (textured ? 7u : 0u) &&
+                                (p.groups[g].RenderKind == VelRenderTextured) == textured))) << entry.second << " group " << g;
             }
-            EXPECT_GT(primitive.groups.GetSize(), 0) << entity->name;
-            for (int g = 0; g < primitive.groups.GetSize(); ++g)
-                EXPECT_GT(primitive.groups[g].vertices.GetSize(), 0) << entity->name << " group " << g;
         }
-    EXPECT_EQ(holed, 4);  // the house's four walls, each with an opening
+    SceneKarvel k;
+    k.camera.aspect = 1.6;
+    ApplySceneView(k, scenes[0]);
+    EXPECT_TRUE(k.camera.eye.x == -5.0 && k.camera.fovy == 40.0 && k.camera.aspect == 1.6 && k.background.r == 0.62f && k.lights == std::vector<int>{1});
 }

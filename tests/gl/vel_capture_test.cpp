@@ -20,7 +20,6 @@ TEST(CaptureBitmap, OddWidthRowsArePaddedToFourBytesInTheReservedBits)
     _DorBitmap bitmap;
     VelEmptyCaptureBitmap(bitmap);
     EXPECT_TRUE(bitmap.bits.GetSize() == 0 && bitmap.info.width == 0 && bitmap.fileSize == 54u && bitmap.info.bitCount == 24);
-    VelBeginCaptureBitmap(bitmap);
     ASSERT_TRUE(VelReserveCaptureBits(bitmap, 101, 50) && bitmap.bits.GetSize() == 304 * 50);
     const unsigned char* reserved = bitmap.bits.GetData();
     std::fill(bitmap.bits.GetData(), bitmap.bits.GetData() + 304 * 50, 0xAB);

@@ -16,9 +16,9 @@ public:
     _VelCamera camera = Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0));
     _VelViewport viewport = {0, 0, 400, 300};
     HDC current = nullptr;  // GetCurrent
-    // HitTest returns `hits`; GetDepthToPoint3 answers depthOrigin + depthStep * depth.
+    // HitTest returns `hits`; GetDepthToPoint3 answers depthStep * depth.
     std::vector<_VelSelect> hits;
-    DorVector3 depthOrigin, depthStep;
+    DorVector3 depthStep;
     std::function<void()> onDraw;  // runs inside every DrawModel
 
     int getCameraCalls = 0, setCameraCalls = 0, setViewportCalls = 0, drawCalls = 0;
@@ -56,7 +56,7 @@ public:
     void GetDepthToPoint3(HDC, int, int, double& depth, DorVector3& point) override
     {
         depthsAsked.push_back(depth);
-        point = depthOrigin + depthStep * depth;
+        point = depthStep * depth;
     }
     _DorPosition* AddPrimitive(CVelPrimitive& primitive) override
     {
@@ -64,7 +64,7 @@ public:
         entities[handle] = primitive;
         return handle;
     }
-    // Reads back the whole primitive; flag 16 (DrawMode) alone leaves the groups alone.
+    // Reads back the whole primitive; a change of flag 16 (DrawMode) alone leaves the groups.
     void GetPrimitive(_DorPosition* position, CVelPrimitive& out, long flags) override
     {
         lastGetFlags = flags;
