@@ -43,8 +43,7 @@ TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
         DorVector3 low, high;
         double sphereDistance;  // 0: not pinned
     } rows[] = {
-        {{0, -100, 30}, aim, 45, 0.5, 1, slabLow, slabHigh, 0},  // a long flat slab off the origin, from the side
-        {{40, 1, 300}, aim, 45, 2.0, 1, slabLow, slabHigh, 0},   // and from straight above
+        {{0, -100, 30}, aim, 45, 0.5, 1, slabLow, slabHigh, 0},  // a long flat slab off the origin
         {{0, -50, 0}, o, 90, 0.5, 1, cube * -1.0, cube, std::sqrt(300.0) / std::sin(std::atan(0.5))},
         {{0, -50, 0}, o, 90, 2.0, 1, cube * -1.0, cube, std::sqrt(300.0) / std::sin(DorPi / 4)},
         {{0, -50, 0}, o, 60, 1, 5, o, {0.01, 0.01, 0.01}, 0},  // a tiny box beyond a far-out near plane

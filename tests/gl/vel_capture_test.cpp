@@ -37,7 +37,7 @@ TEST(CaptureSize, ZeroOversizedAndUnaddressableAreRefused)
     const struct {
         int width, height, max;
         bool allowed;
-    } rows[] = {{1, 1, 16384, true}, {16384, 100, 16384, true}, {100, 16384, 16384, true}, {0, 10, 16384, false}, {10, 0, 16384, false},
+    } rows[] = {{1, 1, 16384, true}, {16384, 16384, 16384, true}, {0, 10, 16384, false}, {10, 0, 16384, false},
                 {16385, 10, 16384, false}, {10, 16385, 16384, false}, {30000, 30000, 65536, false}, {10, 10, 0, false}};
     for (const auto& r : rows)  // 30000 x 30000 would be 3.6 GB of rows; a maximum of 0: no context to ask
         EXPECT_EQ(VelCaptureSizeAllowed(r.width, r.height, r.max, r.max), r.allowed) << r.width << "x" << r.height;

@@ -43,23 +43,10 @@ TEST(KarvelCameraWrappers, EachMoveReadsComputesAndWritesBackOnce)
     k.Dolly(1, 0, 0, 0);
     k.Fly(1, 0, 0, 0);
     k.RoundDolly(0, 10);
-    k.ApproachCamera(DorVector2(200, 150), 100, 0);
-    EXPECT_EQ(k.setCameraCalls, 8);
-}
-
-// Without a current DC, or for pixels no int holds, there is no pick and the camera only turns;
-// with a hit the precise depth picks again. (Where the eye lands is checked on the live modeller.)
-TEST(KarvelApproach, PicksOnlyWithACurrentDCAndAnIntPixel)
-{
-    RecordingKarvel k;
+    k.current = kDC;  // pixels no int holds are not picked
     k.hits = {{k.HandleOf(3), 0.5}};
-    k.ApproachCamera(DorVector2(200, 150), 100, 1);
-    k.current = kDC;
-    k.ApproachCamera(DorVector2(kNaN, 100), 100, 1);
-    k.ApproachCamera(DorVector2(1e12, 100), 100, 1);
-    EXPECT_TRUE(k.camerasAtHitTest.empty() && k.camera.eye.y == 0.0);
-    k.ApproachCamera(DorVector2(200, 150), 100, 1);
-    EXPECT_EQ(k.camerasAtHitTest.size(), 2u);
+    k.ApproachCamera(DorVector2(kNaN, 150), 100, 1);
+    EXPECT_TRUE(k.setCameraCalls == 8 && k.camerasAtHitTest.empty());
 }
 
 // The first estimate lies `ahead` units away with a clip range of 1 .. 100000; the second pick
@@ -85,7 +72,6 @@ TEST(KarvelDepthHi, NarrowsTheClipRangeForTheSecondPickAndRestoresTheCamera)
         EXPECT_EQ(k.depthsAsked, (r.targetHit ? std::vector<double>{0.5, 0.75} : std::vector<double>{0.5}));
         EXPECT_TRUE(point.y == r.point && SameCameraBits(k.camera, before) && k.HitTestS(kDC, 5, 5) == k.HandleOf(1)) << r.ahead;
     }
-    EXPECT_EQ(RecordingKarvel().HitTestS(kDC, 5, 5), nullptr);
 }
 
 // Two groups edited through the part flags 2 (material) and 16 (DrawMode); null handles never

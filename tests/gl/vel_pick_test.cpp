@@ -25,8 +25,8 @@ Hits Listed(const _VelSelect* hits, int count)
 // overflow are checked on the live modeller.)
 TEST(DecodeHits, NamesBecomeHandlesWithinTheBufferAndTheNames)
 {
-    EXPECT_TRUE(VelSelectDepth(0) == 0.0 && VelSelectDepth(0x80000000u) == 0.5 && VelSelectDepth(0xFFFFFFFFu) == 1.0);
-    EXPECT_EQ(VelSelectDepth(0xF0000001u), VelSelectDepth(0xF0000003u));
+    EXPECT_TRUE(VelSelectDepth(0) == 0.0 && VelSelectDepth(0x80000000u) == 0.5 && VelSelectDepth(0xFFFFFFFFu) == 1.0 &&
+                VelSelectDepth(0xF0000001u) == VelSelectDepth(0xF0000003u));
     _DorPosition* names[] = {Handle(16), Handle(32), Handle(48)};
     std::vector<unsigned int> buffer = {1, 0x40000000u, 0, 2, 1, 0x80000000u, 0, 0, 1, 0, 0, 7, 1, 0, 0, 1};
     buffer.resize(VelSelectBufferWords);
