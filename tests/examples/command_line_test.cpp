@@ -17,7 +17,6 @@ TEST(ViewerCommandLine, OptionsInAnyOrderAndMistakesExplained)
         std::string error;  // empty: accepted
     } cases[] = {
         {{"--help"}, ""},
-        {{"house.json"}, ""},
         {{"s.json", "--pick", "500,100", "--size", "640x480"}, ""},
         {{}, "a scene file expected"},
         {{"a.json", "--frames", "10"}, "--frames and --fps belong to --movie"},

