@@ -2,8 +2,7 @@
 
 #include "command_line.h"
 
-// Options come in any order, a pick is checked against the final size, help needs no scene; each
-// mistake is explained.
+// Options come in any order, a pick is checked against the final size; each mistake is explained.
 TEST(ViewerCommandLine, OptionsInAnyOrderAndMistakesExplained)
 {
     ViewerOptions o;
@@ -16,7 +15,6 @@ TEST(ViewerCommandLine, OptionsInAnyOrderAndMistakesExplained)
         std::vector<std::string> args;
         std::string error;  // empty: accepted
     } cases[] = {
-        {{"--help"}, ""},
         {{"s.json", "--pick", "500,100", "--size", "640x480"}, ""},
         {{}, "a scene file expected"},
         {{"a.json", "--frames", "10"}, "--frames and --fps belong to --movie"},
