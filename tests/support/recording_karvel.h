@@ -8,7 +8,7 @@
 
 #include "gl/vel_karvel.h"
 #include "model/dor_math.h"
-#include "support/camera_bits.h"
+#include "camera_bits.h"  // found beside this header, as the DLL test needs
 
 class RecordingKarvel : public CVelKarvel {
 public:
