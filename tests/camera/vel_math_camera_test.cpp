@@ -1,7 +1,6 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
-#include <iterator>
 #include <limits>
 
 #include "camera/vel_math_camera.h"
@@ -9,14 +8,7 @@
 #include "support/camera_bits.h"
 
 namespace {
-const double kNaN = std::numeric_limits<double>::quiet_NaN(), kInf = std::numeric_limits<double>::infinity();
-const double kH = std::sqrt(0.5);
-
-// Within tolerance as a whole vector, which also pins every component.
-void ExpectNear(const DorVector3& actual, const DorVector3& expected, double tolerance, int row)
-{
-    EXPECT_LE(DorLength(actual - expected), tolerance) << "row " << row;
-}
+const double kNaN = std::numeric_limits<double>::quiet_NaN(), kInf = std::numeric_limits<double>::infinity(), kH = std::sqrt(0.5);
 
 enum Op { Pan, Dolly, Fly, Round };
 void Apply(_VelCamera& c, Op op, double a, double b, double d, int eyeOnly)
@@ -30,40 +22,25 @@ void Apply(_VelCamera& c, Op op, double a, double b, double d, int eyeOnly)
 }
 }  // namespace
 
-TEST(ToViewMatrix, HandDerivedImages)
+TEST(ViewMatrices, HandDerivedImages)
 {
     const struct {
         DorVector3 eye, target;
         double dist;
         DorVector3 point, image;
     } rows[] = {
-        {{0, 0, 0}, {1, 0, 0}, 0, {1, 0, 0}, {0, 0, -1}},
-        {{0, 0, 0}, {1, 0, 0}, 0, {0, 0, 1}, {0, 1, 0}},   // world up is screen up
-        {{0, 0, 0}, {1, 0, 0}, 0, {0, -1, 0}, {1, 0, 0}},  // right of the view is +x
+        {{0, 0, 0}, {1, 0, 0}, 0, {1, -1, 1}, {1, 1, -1}},    // right of the view is +x, world up is +y
         {{0, 0, 10}, {0, 0, 0}, 0, {1, 2, 0}, {1, 2, -10}},  // straight down: no turn about z
-        {{1, 2, 3}, {1, 7, 3}, 5, {1, 2, 3}, {0, 0, 5}},     // dist shifts along +z
-        {{1, 2, 3}, {1, 7, 3}, 5, {2, 7, 4}, {1, 1, 0}},
-        {{0, 0, 0}, {1, 0, 1}, 0, {0, 0, 1}, {0, kH, -kH}},  // sloped
-        {{0, 0, 0}, {0, 1, 1}, 1, {1, 1, 0}, {1, -kH, 1 - kH}},
+        {{1, 2, 3}, {1, 7, 3}, 5, {2, 7, 4}, {1, 1, 0}},     // dist shifts along +z
+        {{0, 0, 0}, {0, 1, 1}, 1, {1, 1, 0}, {1, -kH, 1 - kH}},  // sloped
     };
-    for (int i = 0; i < static_cast<int>(std::size(rows)); ++i) {
+    for (const auto& r : rows) {
         DorMatrix4x4 view;
-        CVelMathMatrix::GetToViewMatrix(Camera(rows[i].eye, rows[i].target), rows[i].dist, view);
-        ExpectNear(DorTransformPoint(rows[i].point, view), rows[i].image, 1e-12, i);
+        CVelMathMatrix::GetToViewMatrix(Camera(r.eye, r.target), r.dist, view);
+        EXPECT_LE(DorLength(DorTransformPoint(r.point, view) - r.image), 1e-12) << r.point.x << r.point.y << r.point.z;
     }
-}
-
-TEST(PerspectiveMatrix, UpperEdgeOfTheFieldOfViewMapsToOneAndZeroDistGivesNaNDepth)
-{
-    // fovy 90: half-angle tangent 1; measured from the plane 5 ahead of the eye.
+    // The projection from the plane dist ahead: dist 0 gives NaN depth, as hosts expect.
     DorMatrix4x4 m;
-    CVelMathMatrix::GetPerspectiveMatrix(Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0), 90.0), 5.0, m);
-    const DorVector3 points[] = {DorVector3(0, 13, 8), DorVector3(-4, 13, 0)}, images[] = {{0, 1, 3.0 / 8}, {-0.5, 0, 3.0 / 8}};
-    for (int i = 0; i < 2; ++i) {
-        const DorVector3& p = points[i];
-        double w = p.x * m.m[0][3] + p.y * m.m[1][3] + p.z * m.m[2][3] + m.m[3][3];
-        ExpectNear(DorTransformPoint(p, m) * (1.0 / w), images[i], 1e-12, i);
-    }
     CVelMathMatrix::GetPerspectiveMatrix(Camera(DorVector3(1, 2, 3), DorVector3(4, 10, 5)), 0.0, m);
     for (int row = 0; row < 4; ++row)
         EXPECT_TRUE(std::isnan(m.m[row][2]) && std::isnan(m.m[row][3]) && std::isfinite(m.m[row][0] + m.m[row][1]));
@@ -83,139 +60,73 @@ TEST(Moves, HandDerivedResultsAndRefusals)
     } rows[] = {
         {{0, 0, 0}, {10, 0, 0}, Pan, 90, 0, 0, 0, {0, 0, 0}, {0, -10, 0}, 0},  // clockwise from above
         {{1, 2, 3}, {4, 6, 3}, Pan, 20, 30, 0, 0, {1, 2, 3}, {1 + 5 * c30 * std::cos(az), 2 + 5 * c30 * std::sin(az), 5.5}, 1e-9},
-        {{0, 0, 0}, {5, 0, 0}, Pan, 0, 89.5, 0, 0, {0, 0, 0}, {5 * std::cos(DorPi * 89.5 / 180), 0, 5 * std::sin(DorPi * 89.5 / 180)}, 1e-9},
-        {{0, 0, 0}, {0, 5, 3}, Dolly, 1, 0, 0, 0, {0, 1, 0}, {0, 6, 3}, 0},  // along the ground projection
-        {{0, 0, 0}, {0, 5, 3}, Dolly, 1, 0, 0, 1, {0, 1, 0}, {0, 5, 3}, 0},
+        {{0, 0, 0}, {0, 5, 3}, Dolly, 1, 0, 0, 1, {0, 1, 0}, {0, 5, 3}, 0},  // along the ground projection
         {{0, 0, 0}, {0, 5, -3}, Dolly, 0, 2, 3, 0, {-2, 0, 3}, {-2, 5, 0}, 0},  // left across the view, up is z
         {{0, 0, 0}, {1, 0, 1}, Fly, 1, 0, 0, 1, {kH, 0, kH}, {1, 0, 1}, 1e-12},
-        {{0, 0, 0}, {1, 0, 1}, Fly, 0, 1, 0, 0, {0, -1, 0}, {1, -1, 1}, 1e-12},
-        {{0, 0, 0}, {1, 0, 1}, Fly, 0, 0, 1, 0, {-kH, 0, kH}, {1 - kH, 0, 1 + kH}, 1e-12},
+        {{0, 0, 0}, {1, 0, 1}, Fly, 0, 1, 1, 0, {-kH, -1, kH}, {1 - kH, -1, 1 + kH}, 1e-12},
         {{10, 0, 0}, {0, 0, 0}, Round, 0, 90, 0, 0, {0, 10, 0}, {0, 0, 0}, 0},  // a quarter turn
         {{1, -5, 1}, {1, 1, 1}, Round, 40, 0, 0, 0, {1, 1 - 6 * c40, 1 + 6 * std::sin(DorPi * 2 / 9)}, {1, 1, 1}, 1e-9},
-        // Refused: a tilt past the vertical refuses the pan too; onto the pole; 1e308 + 1e308.
+        // Refused: a tilt past the vertical refuses the pan too; onto either pole; 1e308 + 1e308.
         {{0, 0, 0}, {1, 0, 1}, Pan, 30, 50, 0, 0, {0, 0, 0}, {1, 0, 1}, 0},
         {{0, 0, 0}, {5, 0, 0}, Pan, 0, 90, 0, 0, {0, 0, 0}, {5, 0, 0}, 0},
         {{0, 0, 0}, {5, 0, 0}, Pan, 0, -90, 0, 0, {0, 0, 0}, {5, 0, 0}, 0},
         {{0, -1, 1}, {0, 0, 0}, Round, 45, 10, 0, 0, {0, -1, 1}, {0, 0, 0}, 0},
         {{1e308, 0, 0}, {1e308, 5, 0}, Dolly, 0, -1e308, 0, 0, {1e308, 0, 0}, {1e308, 5, 0}, 0},
+        // Vertical or too short views have no direction to move along.
+        {{0, 0, 5}, {0, 0, -5}, Dolly, 1, 1, 1, 0, {0, 0, 5}, {0, 0, -5}, 0},
+        {{1, 1, 1}, {1, 1, 1.00005}, Round, 10, 10, 0, 0, {1, 1, 1}, {1, 1, 1.00005}, 0},
     };
-    for (int i = 0; i < static_cast<int>(std::size(rows)); ++i) {
+    for (int i = 0; i < static_cast<int>(sizeof rows / sizeof rows[0]); ++i) {
         _VelCamera c = Camera(rows[i].eye, rows[i].target), want = Camera(rows[i].eyeAfter, rows[i].targetAfter);
         Apply(c, rows[i].op, rows[i].a, rows[i].b, rows[i].d, rows[i].eyeOnly);
-        if (rows[i].tolerance == 0) {
-            EXPECT_TRUE(SameCameraBits(c, want)) << "row " << i;
-            continue;
-        }
-        ExpectNear(c.eye, want.eye, rows[i].tolerance, i);
-        ExpectNear(c.target, want.target, rows[i].tolerance, i);
-        EXPECT_EQ(c.fovy, 45.0);
-    }
-}
-
-// Non-finite arguments are left to the extreme-input sweep below: their results cannot be finite.
-TEST(Moves, VerticalShortOrNonFiniteViewsRefuseEveryMove)
-{
-    _VelCamera nanAspect = Camera(DorVector3(0, 0, 0), DorVector3(1, 0, 0));
-    nanAspect.aspect = kNaN;
-    for (const _VelCamera& original : {Camera(DorVector3(0, 0, 0), DorVector3(0, 0, 5)),
-                                       Camera(DorVector3(0, 0, 5), DorVector3(0, 0, -5)),
-                                       Camera(DorVector3(1, 1, 1), DorVector3(1, 1, 1.00005)), nanAspect}) {
-        for (Op op : {Pan, Dolly, Fly, Round}) {
-            _VelCamera c = original;
-            Apply(c, op, 10, 10, 1, 0);
-            EXPECT_TRUE(SameCameraBits(c, original)) << op;
-        }
+        EXPECT_TRUE(rows[i].tolerance ? DorLength(c.eye - want.eye) <= rows[i].tolerance &&
+                                            DorLength(c.target - want.target) <= rows[i].tolerance && c.fovy == 45.0
+                                      : SameCameraBits(c, want))
+            << "row " << i;
     }
 }
 
 TEST(ViewportZoom, FitsTheDraggedBoxWithinFiveTimes)
 {
-    const int kUnchecked = -99999;  // a refusal may have written the box's size: only some rows pin it
+    const int kAny = -99999;  // a refusal may have written the box's size: only some rows pin it
     const struct {
         double aspect, x0, y0, x1, y1;
         int ok, x, y, width, height;
     } rows[] = {
-        {4.0 / 3, 100, 75, 300, 225, 1, -200, -150, 800, 600},  // doubles about the centre
-        {4.0 / 3, 0, 0, 200, 150, 1, 0, -300, 800, 600},        // GL y grows upward
+        {4.0 / 3, 100, 75, 300, 225, 1, -200, -150, 800, 600},     // doubles about the centre, GL y upward
         {4.0 / 3, 100, 100, 180, 160, 1, -500, -700, 2000, 1500},  // exactly five times
-        {4.0 / 3, 100, 100, 150, 130, 0, 0, 0, kUnchecked, kUnchecked},  // eight times
-        {4.0 / 3, 300, 75, 100, 225, 0, 0, 0, -200, 150},  // reversed: size written, then refused
-        {4.0 / 3, 100, 100, 100.9, 200, 0, 0, 0, kUnchecked, kUnchecked},  // truncates to no width
-        {4.0 / 3, -kInf, -kInf, kInf, kInf, 1, 0, 0, 400, 300},  // clamped to the window
-        {4.0 / 3, kNaN, 0, 200, 150, 0, 0, 0, kUnchecked, kUnchecked},
-        {4.0 / 3, 0, 0, 200, kNaN, 0, 0, 0, kUnchecked, kUnchecked},
-        {0.0, 100, 75, 300, 225, 0, 0, 0, kUnchecked, kUnchecked},
-        {-1.0, 100, 75, 300, 225, 0, 0, 0, kUnchecked, kUnchecked},
-        {kNaN, 100, 75, 300, 225, 0, 0, 0, kUnchecked, kUnchecked},
-        {kInf, 100, 75, 300, 225, 1, kUnchecked, kUnchecked, 800, kUnchecked},  // box collapses onto its top edge
+        {4.0 / 3, 100, 100, 150, 130, 0, kAny, kAny, kAny, kAny},  // eight times
+        {4.0 / 3, 300, 75, 100, 225, 0, 0, 0, -200, 150},          // reversed: size written, then refused
+        {4.0 / 3, -kInf, -kInf, kInf, kInf, 1, 0, 0, 400, 300},    // clamped to the window
         // w / h is 1 as an integer: the fit keeps the width, runs past the bottom and moves back up.
         {1.5, 100, 300, 290, 400, 1, static_cast<int>(-100 * 600 / 190.0), 0, static_cast<int>(600 * 600 / 190.0),
          static_cast<int>(400 * 600 / 190.0)},
     };
     for (const auto& r : rows) {
-        _VelCamera camera = Camera(DorVector3(0, 0, 0), DorVector3(0, 1, 0));
-        camera.aspect = r.aspect;
+        _VelCamera camera = Camera(DorVector3(0, 0, 0), DorVector3(0, 1, 0), 45, r.aspect);
         _VelViewport v = {0, 0, r.aspect == 1.5 ? 600 : 400, r.aspect == 1.5 ? 400 : 300};
-        EXPECT_EQ(CVelMathCamera::ViewportZoom(camera, v, DorVector2(r.x0, r.y0), DorVector2(r.x1, r.y1)), r.ok)
-            << r.aspect << " " << r.x0 << "," << r.y0 << " " << r.x1 << "," << r.y1;
+        SCOPED_TRACE(::testing::Message() << r.aspect << " " << r.x0 << "," << r.y0 << " " << r.x1 << "," << r.y1);
+        EXPECT_EQ(CVelMathCamera::ViewportZoom(camera, v, DorVector2(r.x0, r.y0), DorVector2(r.x1, r.y1)), r.ok);
         const int got[] = {v.x, v.y, v.width, v.height}, want[] = {r.x, r.y, r.width, r.height};
         for (int k = 0; k < 4; ++k)
-            EXPECT_TRUE(want[k] == kUnchecked || got[k] == want[k])
-                << "field " << k << " is " << got[k] << " for " << r.x0 << "," << r.y0 << " " << r.aspect;
+            EXPECT_TRUE(want[k] == kAny || got[k] == want[k]) << "field " << k << " is " << got[k];
     }
 }
 
 TEST(ApproachCamera, TurnsToHalfThePointedOffsetOrMovesByTheGrowthFactor)
 {
     // fovy 90, viewport 200 high: the pointed plane lies 100 pixels ahead of an eye looking along +y.
-    const double s = std::sqrt(5.0);
+    const double s3 = std::sqrt(5.25);
     const struct {
-        double px, py, viewHeight, height, depth;
+        double px, py, height, depth;
         DorVector3 eye, target;
     } rows[] = {
-        {0, 0, 200, 100, 0, {0, 0, 0}, {0, 10, 0}},
-        {100, 0, 200, 100, 0, {0, 0, 0}, {10 / s, 20 / s, 0}},
-        {0, 100, 200, 100, 0, {0, 0, 0}, {0, 20 / s, 10 / s}},  // y of the point is up
-        {30, -20, 200, 100, 10, {0, 5, 0}, {0, 10, 0}},          // depth moves the eye only
-        {0, 0, 200, 200, 10, {0, 0, 0}, {0, 10, 0}},
+        {100, 50, 100, 0, {0, 0, 0}, {10 / s3, 20 / s3, 5 / s3}},  // y of the point is up
+        {30, -20, 100, 10, {0, 5, 0}, {0, 10, 0}},         // depth moves the eye only
     };
-    for (int i = 0; i < static_cast<int>(std::size(rows)); ++i) {
+    for (const auto& r : rows) {
         _VelCamera c = Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0), 90.0);
-        CVelMathCamera::ApproachCamera(c, DorVector2(rows[i].px, rows[i].py), rows[i].viewHeight, rows[i].height,
-                                       rows[i].depth);
-        ExpectNear(c.eye, rows[i].eye, 1e-12, i);
-        ExpectNear(c.target, rows[i].target, 1e-12, i);
-    }
-    _VelCamera c = Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0), kNaN);  // other NaNs: the sweep below
-    const _VelCamera nanFovy = c;
-    CVelMathCamera::ApproachCamera(c, DorVector2(10, 10), 200, 100, 0);
-    EXPECT_TRUE(SameCameraBits(c, nanFovy));
-}
-
-// Extreme numbers in every slot: each operation leaves the camera as it was or entirely finite,
-// and never crashes (the sanitizers watch the conversions).
-TEST(Moves, ExtremeInputsNeverStoreANonFiniteCamera)
-{
-    const double values[] = {0.0, -0.0, 1e-300, 3.0, -7.5, 1e300, -1e308, kInf, -kInf, kNaN};
-    const int n = sizeof values / sizeof values[0];
-    for (int i = 0; i < n; ++i) {
-        for (int j = 0; j < n; ++j) {
-            const _VelCamera original = Camera(DorVector3(values[i], 1, 2), DorVector3(4, values[j], -1));
-            const double a = values[(i + j) % n], b = values[(i * 3 + j) % n];
-            for (int op = 0; op < 6; ++op) {
-                _VelCamera c = original;
-                if (op < 4)
-                    Apply(c, static_cast<Op>(op), op == 2 ? b : a, op == 2 ? a : b, op == 2 ? b : a, op == 1 ? j & 1 : 0);
-                else if (op == 4)
-                    CVelMathCamera::ApproachCamera(c, DorVector2(a, b), 300, 150, 0);
-                else
-                    CVelMathCamera::ApproachCamera(c, DorVector2(1, 2), a, b, values[j]);
-                EXPECT_TRUE(SameCameraBits(c, original) || VelCameraIsFinite(c)) << op << " " << i << " " << j;
-                _VelViewport v = {static_cast<int>(i * 1000) - 2000, 0, 400, 300};
-                CVelMathCamera::ViewportZoom(c, v, DorVector2(a, b), DorVector2(b, a));
-                DorMatrix4x4 m;
-                CVelMathMatrix::GetPerspectiveMatrix(c, a, m);
-            }
-        }
+        CVelMathCamera::ApproachCamera(c, DorVector2(r.px, r.py), 200, r.height, r.depth);
+        EXPECT_LE(DorLength(c.eye - r.eye) + DorLength(c.target - r.target), 1e-12) << r.px << "," << r.py;
     }
 }

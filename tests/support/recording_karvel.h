@@ -1,6 +1,6 @@
 #pragma once
 // A test-double modeller for the interface's own members: it stores a camera, a viewport and
-// whole primitives, answers picks from a scripted hit list, and counts what the interface asks
+// whole primitives, answers picks from a scripted hit list, and records what the interface asks
 // of it. Portable: no context, no drawing.
 #include <functional>
 #include <map>
@@ -8,37 +8,23 @@
 
 #include "gl/vel_karvel.h"
 #include "model/dor_math.h"
+#include "camera_bits.h"  // found beside this header, as the DLL test needs
 
 class RecordingKarvel : public CVelKarvel {
 public:
-    RecordingKarvel()
-    {
-        camera.eye = DorVector3(0, 0, 0);
-        camera.target = DorVector3(0, 10, 0);
-        camera.fovy = 45.0;
-        camera.zNear = 1.0;
-        camera.zFar = 1000.0;
-        camera.aspect = 4.0 / 3.0;
-    }
-
-    // What GetCamera / GetViewport hand out and Set* overwrite (no validation: the double shows
-    // exactly what the interface wrote).
-    _VelCamera camera;
+    // What GetCamera / GetViewport hand out and Set* overwrite, unvalidated.
+    _VelCamera camera = Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0));
     _VelViewport viewport = {0, 0, 400, 300};
     HDC current = nullptr;  // GetCurrent
-
-    // Picking: HitTest returns `hits` as they stand; GetDepthToPoint3 answers
-    // depthOrigin + depthStep * depth.
+    // HitTest returns `hits`; GetDepthToPoint3 answers depthStep * depth.
     std::vector<_VelSelect> hits;
-    DorVector3 depthOrigin, depthStep;
-
-    int getCameraCalls = 0, setCameraCalls = 0, setViewportCalls = 0, drawCalls = 0;
-    int hitTestCalls = 0, depthCalls = 0;
-    std::vector<_VelCamera> camerasAtHitTest;
-    std::vector<double> depthsAsked;
+    DorVector3 depthStep;
     std::function<void()> onDraw;  // runs inside every DrawModel
 
-    // The entity store: whole primitives under fake handles; flags of the last Get/Change.
+    int getCameraCalls = 0, setCameraCalls = 0, setViewportCalls = 0, drawCalls = 0;
+    std::vector<_VelCamera> camerasAtHitTest;
+    std::vector<double> depthsAsked;
+    // Whole primitives under fake handles; flags of the last Get/Change.
     std::map<_DorPosition*, CVelPrimitive> entities;
     long lastGetFlags = 0, lastChangeFlags = 0;
 
@@ -48,94 +34,52 @@ public:
     int Initialize(HDC&) override { return 1; }
     void Finalize() override {}
     HDC GetCurrent() override { return current; }
-    void RemoveShapeAt(_DorPosition*& position) override
-    {
-        entities.erase(position);
-        position = nullptr;
-    }
+    void RemoveShapeAt(_DorPosition*& position) override { entities.erase(position), position = nullptr; }
     void RemoveShapeAll() override { entities.clear(); }
     CDorArray<long, long>* GetFreeProperty(_DorPosition*&) override { return nullptr; }
-
-    void GetCamera(_VelCamera& out) override
-    {
-        ++getCameraCalls;
-        out = camera;
-    }
-    void SetCamera(const _VelCamera& in) override
-    {
-        ++setCameraCalls;
-        camera = in;
-    }
+    void GetCamera(_VelCamera& out) override { ++getCameraCalls, out = camera; }
+    void SetCamera(const _VelCamera& in) override { ++setCameraCalls, camera = in; }
     void GetViewport(_VelViewport& out) override { out = viewport; }
-    void SetViewport(_VelViewport& in) override
-    {
-        ++setViewportCalls;
-        viewport = in;
-    }
+    void SetViewport(_VelViewport& in) override { ++setViewportCalls, viewport = in; }
     void DrawModel(HDC&) override
     {
         ++drawCalls;
         if (onDraw)
             onDraw();
     }
-
     void HitTest(HDC, int, int, CDorArray<_VelSelect, _VelSelect&>& out) override
     {
-        ++hitTestCalls;
         camerasAtHitTest.push_back(camera);
-        if (hits.empty())
-            return;
-        out.SetSize(static_cast<int>(hits.size()));
-        for (size_t i = 0; i < hits.size(); ++i)
-            out[static_cast<int>(i)] = hits[i];
+        for (_VelSelect hit : hits)
+            out.Add(hit);
     }
     void GetDepthToPoint3(HDC, int, int, double& depth, DorVector3& point) override
     {
-        ++depthCalls;
         depthsAsked.push_back(depth);
-        point = depthOrigin + depthStep * depth;
+        point = depthStep * depth;
     }
-
     _DorPosition* AddPrimitive(CVelPrimitive& primitive) override
     {
         _DorPosition* handle = HandleOf(static_cast<int>(entities.size()));
         entities[handle] = primitive;
         return handle;
     }
-    // Flag bits as the OpenGL modeller reads them: 1 vertices, 2 materials, 16 DrawMode.
+    // Reads back the whole primitive; a change of flag 16 (DrawMode) alone leaves the groups.
     void GetPrimitive(_DorPosition* position, CVelPrimitive& out, long flags) override
     {
         lastGetFlags = flags;
-        auto found = entities.find(position);
-        if (found == entities.end())
-            return;
-        const CVelPrimitive& stored = found->second;
-        out.DeleteAll();
-        out.groups.SetSize(stored.groups.GetSize());
-        for (int g = 0; g < stored.groups.GetSize(); ++g) {
-            if (flags & 1)
-                out.groups[g].vertices = stored.groups[g].vertices;
-            if (flags & 2)
-                out.groups[g].material = stored.groups[g].material;
-        }
-        if (flags & 16)
-            out.DrawMode = stored.DrawMode;
+        if (entities.count(position))
+            out = entities[position];
     }
     void ChangePrimitive(_DorPosition* position, CVelPrimitive& in, long flags) override
     {
         lastChangeFlags = flags;
-        auto found = entities.find(position);
-        if (found == entities.end())
+        if (!entities.count(position))
             return;
-        CVelPrimitive& stored = found->second;
-        for (int g = 0; g < stored.groups.GetSize() && g < in.groups.GetSize(); ++g) {
-            if (flags & 1)
-                stored.groups[g].vertices = in.groups[g].vertices;
-            if (flags & 2)
-                stored.groups[g].material = in.groups[g].material;
-        }
         if (flags & 16)
-            stored.DrawMode = in.DrawMode;
+            entities[position].DrawMode = in.DrawMode;
+        if (flags & ~16L)
+            entities[position].groups = in.groups;
     }
 
 private:
