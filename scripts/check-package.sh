@@ -17,7 +17,9 @@ for dir in bin/karvel.dll lib/libkarvel.dll.a include/karvel/karvel.h lib/cmake/
 done
 
 common=(-DCMAKE_BUILD_TYPE=Release -DCMAKE_TOOLCHAIN_FILE="$PWD/cmake/$preset.cmake")
-cmake -S tests/package -B "$build/host-installed" "${common[@]}" -DCMAKE_PREFIX_PATH="$build/install" >/dev/null
+# NOTE: the MinGW toolchain files confine package searches to the MinGW sysroot (so that the
+# build machine's own packages stay out), which re-roots CMAKE_PREFIX_PATH; karvel_DIR is taken as given.
+cmake -S tests/package -B "$build/host-installed" "${common[@]}" -Dkarvel_DIR="$build/install/lib/cmake/karvel" >/dev/null
 cmake --build "$build/host-installed" -j "$jobs"
 cmake -S tests/package -B "$build/host-subdirectory" "${common[@]}" -DKARVEL_SOURCE_DIR="$PWD" >/dev/null
 cmake --build "$build/host-subdirectory" -j "$jobs"
