@@ -30,6 +30,8 @@ if [ "${1:-}" = --compile ]; then
   obj="$out/$target/obj/${source//\//_}.obj"
   msabi_flags "$target"
   case $source in
+    # The host project includes <karvel/karvel.h> as installed; a one-line stand-in maps it here.
+    tests/package/*) flags+=("-I$out/host-include") ;;&
     tests/*) flags+=(/DKARVEL_STATIC "/DKARVEL_SOURCE_DIR=\"$PWD\"" "/DKARVEL_VIEWER_EXE=\"karvel_viewer.exe\""
                     -Itests -Iexamples/viewer -I/usr/src/googletest/googletest/include) ;;
     examples/*) flags+=(-Iexamples/viewer) ;;
@@ -55,6 +57,8 @@ mkdir -p "$out/include"
 ln -sfn /usr/share/mingw-w64/include/GL "$out/include/GL"
 ln -sfn /usr/include/nlohmann "$out/include/nlohmann"
 ln -sfn /usr/include/stb "$out/include/stb"
+mkdir -p "$out/host-include/karvel"
+echo "#include \"$PWD/karvel.h\"" > "$out/host-include/karvel/karvel.h"
 
 sources=$( (ls model/*.cpp gl/*.cpp convert/*.cpp camera/*.cpp primitives/*.cpp movie/*.cpp \
             examples/viewer/*.cpp; find tests -name '*.cpp') | grep -v '/std_' | grep -E "${KARVEL_MSABI_ONLY:-.}" | sort)

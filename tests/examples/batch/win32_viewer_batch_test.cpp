@@ -66,6 +66,11 @@ public:
         for (int tries = 0; tries < 200 && !(frame && IsWindowVisible(frame)); ++tries, Sleep(50))
             frame = FindWindowA("KarvelViewerFrame", nullptr);
         view = FindWindowExA(frame, nullptr, "KarvelViewerView", nullptr);
+        if (!view) {  // NOTE: under Wine the viewer shows its view as a popup owned by the frame
+            view = FindWindowA("KarvelViewerView", nullptr);
+            if (view && GetWindow(view, GW_OWNER) != frame)
+                view = nullptr;
+        }
         status = FindWindowExA(frame, nullptr, "msctls_statusbar32", nullptr);
         return view && status;
     }
