@@ -57,8 +57,8 @@ TEST(DorList, MovingToHeadOrTailWritesTheHandleBackAndCopiesKeepOrder)
     EXPECT_EQ(CDorList::GetAt(h[0]), &v[0]);
     CDorList copy(list);
     EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1, 3, 0}));
-    copy = CDorList();
-    EXPECT_EQ(copy.GetCount(), 0);
+    copy = CDorList(3);  // the block size comes with the assignment
+    EXPECT_TRUE(copy.GetCount() == 0 && copy.blockSize == 3);
     CDorList single;
     _DorPosition* only = single.AddTail(&v[1]);
     single.MoveToHead(only);  // frees every block on the way: the handle must be the new one
