@@ -3,7 +3,7 @@
 #include "model/vel_primitive.h"
 
 // Assignment is deep and keeps the destination's storage; RemoveAll resets the kind of group but
-// keeps its look; a primitive keeps its draw mode through assignment and DeleteAll.
+// keeps its look.
 TEST(TrianglePolys, AssignmentIsDeepAndClearingKeepsTheLook)
 {
     CVelTrianglePolys src, dst;
@@ -27,17 +27,6 @@ TEST(TrianglePolys, AssignmentIsDeepAndClearingKeepsTheLook)
     EXPECT_TRUE(dst.vertices.GetSize() == 0 && dst.triangles.GetSize() == 0 && dst.triangles.maxSize == 0);
     EXPECT_TRUE(dst.material.shininess == 5.0f && dst.lineWidth == 3.0f && dst.OverlayFlag == 1);
 
-    CVelPrimitive five, two;
-    EXPECT_EQ(five.DrawMode, 2);  // pickable
-    five.groups.SetSize(5);
-    five.groups[4].vertices.SetSize(9);
-    two.groups.SetSize(2);
-    two.groups[1].GroupType = VelGroupLines;
-    two.DrawMode = 3;
-    five = two;
-    EXPECT_TRUE(five.groups.GetSize() == 2 && five.groups.maxSize == 5 && five.groups[1].GroupType == 1 && five.DrawMode == 3);
-    five.DeleteAll();
-    EXPECT_TRUE(five.groups.GetSize() == 0 && five.groups.maxSize == 0 && five.DrawMode == 3);
 }
 
 TEST(DrawnElementCount, FollowsTheGroupType)
