@@ -55,7 +55,6 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
         const bool finite = VelCameraIsFinite(camera);
         const _VelCamera before = camera;
         const int op = r.Int(0, 9);
-        if (getenv("FUZZ_TRACE")) fprintf(stderr, "op %d finite %d\n", op, finite);
         switch (op) {
         case 0: CVelMathCamera::PanTilt(camera, r.Number(), r.Number()); break;
         case 1: CVelMathCamera::Dolly(camera, r.Number(), r.Number(), r.Number(), r.Int(0, 1)); break;
