@@ -44,7 +44,7 @@ void Array(FuzzReader& r)
     std::vector<int> model;
     for (int k = r.Int(0, 24); k > 0; --k) {
         const int value = r.Int(INT_MIN, INT_MAX);
-        switch (r.Int(0, 4)) {
+        switch (r.Int(0, 3)) {
         case 0: {
             const int n = r.Int(-2, 64);
             array.SetSize(n, r.Int(-1, 8));
@@ -54,25 +54,18 @@ void Array(FuzzReader& r)
         case 1: FUZZ_CHECK(array.Add(value) == static_cast<int>(model.size())); model.push_back(value); break;
         case 2: {
             const int index = r.Int(0, 3) ? r.Int(0, 64) : INT_MAX;
+            const bool own = !model.empty() && r.Int(0, 1);  // the last element, which growth moves
+            const int stored = own ? model.back() : value;
             try {
-                array.SetAtGrow(index, value);
+                array.SetAtGrow(index, own ? array[array.GetSize() - 1] : value);
             } catch (const std::bad_alloc&) {
                 FUZZ_CHECK(index == INT_MAX);  // refused before anything changed
                 break;
             }
-            if (index >= static_cast<int>(model.size()))
-                model.resize(index + 1, 0);
-            model[index] = value;
+            model.resize(std::max<size_t>(model.size(), index + 1u), 0);
+            model[index] = stored;
             break;
         }
-        case 3:
-            if (!model.empty()) {
-                const int index = r.Int(0, 64), last = model.back();
-                array.SetAtGrow(index, array[static_cast<int>(model.size()) - 1]);
-                model.resize(std::max<size_t>(model.size(), index + 1), 0);
-                model[index] = last;
-            }
-            break;
         default: { CDorArray<int> copy(array); array = copy; }
         }
         FUZZ_CHECK(array.GetSize() == static_cast<int>(model.size()) && array.maxSize >= array.size);

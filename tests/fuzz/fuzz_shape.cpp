@@ -26,7 +26,8 @@ void Dress(FuzzReader& r, CDorGeometry& g)
     g.texture = r.Int(0, 1);
     g.textureScaleU = r.Int(0, 1) ? r.Number() : 0.5;
     g.textureScaleV = r.Int(0, 1) ? r.Number() : 2.0;
-    r.wild = r.wild || g.textureScaleU == 0.0 || g.textureScaleV == 0.0;  // infinite by definition
+    // A scale of 0 gives infinite coordinates by definition; a tiny one overflows them.
+    r.wild = r.wild || !(std::fabs(g.textureScaleU) >= 1e-6 && std::fabs(g.textureScaleV) >= 1e-6);
 }
 
 void CheckGroups(const FuzzReader& r, const CVelGroupArray& groups)
