@@ -84,12 +84,12 @@ TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
         EXPECT_TRUE(SameCameraBits(c, before)) << before.fovy;
     }
     // Nor is any camera on a box with a corner that is not finite, or too large for doubles.
-    for (const DorVector3& far : {DorVector3(NAN, 0, 0), DorVector3(0, HUGE_VAL, 0), one * 1e308}) {
+    for (const DorVector3& corner : {DorVector3(NAN, 0, 0), DorVector3(0, HUGE_VAL, 0), one * 1e308}) {
         const _VelCamera before = Camera(south, o, 45, 1);
         c = before;
-        CVelMathCamera::FitViewToSphere(c, far * -1.0, far);
-        CVelMathCamera::FitViewToBox(c, o, far);
-        EXPECT_TRUE(SameCameraBits(c, before)) << far.x << " " << far.y;
+        CVelMathCamera::FitViewToSphere(c, corner * -1.0, corner);
+        CVelMathCamera::FitViewToBox(c, o, corner);
+        EXPECT_TRUE(SameCameraBits(c, before)) << corner.x << " " << corner.y;
     }
 }
 
