@@ -11,6 +11,10 @@
 /// groups; bare polygons, null entries, unknown kinds and styles are skipped silently. Failures
 /// show only as missing groups. Reentrant: conversions share nothing and may run on any thread,
 /// as long as no two of them touch the same shape.
+///
+/// Coordinates, texture axes and scales that are NaN or infinite are not refused here: they
+/// convert without undefined behaviour, into groups whose vertices may be NaN or infinite, or into
+/// fewer groups. Indices always lie within their group's vertices.
 class KARVEL_API CVelShapeToPrimitive {
 public:
     ///@{

@@ -263,7 +263,9 @@ public:
     void AnimationCamera(_VelCamera from, _VelCamera to, double duration, HDC dc);
     /// Fit-all with a glide: the camera that SetCameraForAllView_Hi(filter) computes is reached
     /// over duration milliseconds of AnimationCamera on dc, then set exactly and drawn once more.
-    /// When the fit leaves the camera as it is (an empty model) nothing is drawn.
+    /// When the fit leaves the camera as it is (an empty model) nothing is drawn. A camera that
+    /// holds inf or NaN is never glided from: the fit, if it finds one, is set and drawn once;
+    /// otherwise nothing is drawn.
     void KarvelAllmodelView(HDC dc, int filter, double duration);
     /// The same after returning to the reset viewport (applied, with the camera's aspect ratio),
     /// which undoes every ViewportZoom.

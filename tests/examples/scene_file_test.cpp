@@ -20,6 +20,7 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
         std::string text, message;  // message without the leading "test.json: "
     } cases[] = {
         {"{\n  \"camera\": {\"eye\": [0, 0, 1],,\n}", "line 2, column "},  // then what JSON expected there
+        {"{\"camera\": {\"eye\": [1e400", "line 1, column 25: expected valid JSON (number overflow parsing '1e400')"},
         {scene + w + "}]}", "entities[0] (\"w\"): expected \"extrude\" (the vector from the profile to the top face) or \"top\" (the top profile)"},
         {scene + R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,"a"],[0,1,0]], "extrude": [0,0,1]}]})",
          "entities[0] (\"w\").profile[1][2]: expected a number, found the string \"a\""},
