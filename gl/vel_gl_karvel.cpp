@@ -2,10 +2,10 @@
 // camera, cull mode, background and offset.
 #include "gl/vel_gl_karvel.h"
 
+#include <string>
+
 #include "camera/vel_math_camera.h"
 #include "gl/vel_misuse.h"
-
-#include <string>
 
 CVelGLKarvel::CVelGLKarvel(const CVelGLKarvel& other)
     : CVelKarvel(other), model(other.model), renderState(nullptr), context(other.context), modelScale(other.modelScale)
@@ -188,7 +188,7 @@ namespace {
 template <class Result>
 Result UploadedLater(Result stored, const CVelGLRenderState* renderState, const char* operation)
 {
-    if (stored && renderState)
+    if (stored && renderState && VelCheckedMode())
         VelReportMisuse((std::string(operation) + " while live: the image waits for the next Initialize or SetCurrent").c_str());
     return stored;
 }

@@ -43,6 +43,8 @@ public:
     /// @copydoc Add(_DorBitmap&)
     int Add(HBITMAP bitmap);
     /// Closes the streams and the file, frees the compressor and the AVI library; idle again.
+    /// Call it only while recording (IsStart): it does not check, as it never has, and an idle
+    /// End releases the AVI library once more than it was opened.
     void End();
     /// 1 between a successful Start and End, else 0.
     int IsStart();
@@ -86,7 +88,8 @@ public:
     int Add(_DorBitmap& bitmap);
     /// @copydoc Add(_DorBitmap&)
     int Add(HBITMAP bitmap);
-    /// Closes the stream and the file and the AVI library; idle again.
+    /// Closes the stream and the file and the AVI library; idle again. Call it only while
+    /// recording, as CVelMathMovie::End.
     void End();
     /// 1 between a successful Start and End, else 0.
     int IsStart();
