@@ -41,9 +41,17 @@ void CVelGLKarvel::RemoveShapeAll()
     model.Destroy();
 }
 
-void CVelGLKarvel::MoveDepthToTail(_DorPosition*& position) { model.MoveToTail(position); }
+void CVelGLKarvel::MoveDepthToTail(_DorPosition*& position)
+{
+    CheckThread("MoveDepthToTail");
+    model.MoveToTail(position);
+}
 
-void CVelGLKarvel::MoveDepthToHead(_DorPosition*& position) { model.MoveToHead(position); }
+void CVelGLKarvel::MoveDepthToHead(_DorPosition*& position)
+{
+    CheckThread("MoveDepthToHead");
+    model.MoveToHead(position);
+}
 
 CDorArray<long, long>* CVelGLKarvel::GetFreeProperty(_DorPosition*& position)
 {
@@ -167,6 +175,7 @@ void CVelGLKarvel::GetPrimitive(_DorPosition* position, CVelPrimitive& primitive
 
 void CVelGLKarvel::MoveShape(_DorPosition* position, DorMatrix4x4& matrix)
 {
+    CheckThread("MoveShape");
     CVelGLScope scope(renderState);
     model.MoveEntity(position, matrix, scope);
 }
@@ -179,6 +188,7 @@ long CVelGLKarvel::GetDrawMode(_DorPosition*& position)
 
 void CVelGLKarvel::SetDrawMode(_DorPosition*& position, long mode)
 {
+    CheckThread("SetDrawMode");
     if (CVelGLEntity* entity = model.EntityAt(position))
         entity->DrawMode = mode;
 }

@@ -289,9 +289,10 @@ public:
 
     /// Checked mode, for hosts in development: off by default (on from the start in a library
     /// built with -DKARVEL_CHECKED=ON). While on, every misuse the library can see is reported as
-    /// one line through OutputDebugStringA and to callback (when not null) with context: a call
-    /// from a thread other than the one that initialised the modeller; drawing, picking or capture
-    /// while no context or another one than the modeller's is current; a handle that is not live
+    /// one line through OutputDebugStringA and to callback (when not null) with context: a change
+    /// of the model, the camera or the viewport, drawing, picking or capture from a thread other
+    /// than the one that initialised the modeller; drawing, picking or capture while no context
+    /// or another one than the modeller's is current; a handle that is not live
     /// in the modeller; a shape with a non-finite coordinate, or a non-finite camera given to
     /// SetCamera; a texture that will not reach OpenGL (added or changed while live, so waiting
     /// for the next Initialize, or refused by the upload). Every result is the same on and off.

@@ -48,8 +48,8 @@ TEST_F(LiveModeller, CheckedModeReportsEachMisuseOnce)
         for (const auto& row : rows) {
             reports.clear();
             row.misuse();
-            ASSERT_EQ(reports.size(), on ? row.reports.size() : 0u) << row.reports[0] << (reports.empty() ? "" : ": " + reports[0]);
-            for (size_t i = 0; i < reports.size(); ++i)
+            EXPECT_EQ(reports.size(), on ? row.reports.size() : 0u) << row.reports[0] << (reports.empty() ? "" : ": " + reports[0]);
+            for (size_t i = 0; i < reports.size() && i < row.reports.size(); ++i)
                 EXPECT_NE(reports[i].find(row.reports[i]), std::string::npos) << reports[i];
         }
         karvel.Initialize(window.dc);
