@@ -40,3 +40,10 @@ protected:
     /// CVelHoleExtrudedToPrimitive::ConvertHoleExtruded on a local converter.
     void ConvertHoleExtruded(CDorHoleExtruded* extruded, CVelGroupArray& groups);
 };
+
+/// @cond KARVEL_INTERNAL
+// Whether every point and texture vector of the extrusions of shape (the geometries it converts;
+// of holed profiles the vectors the holed converters read) is finite. Null entries and other
+// kinds are not read.
+bool VelShapeIsFinite(const CDorShape& shape);
+/// @endcond
