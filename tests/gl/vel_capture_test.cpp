@@ -19,8 +19,9 @@ TEST(CaptureBitmap, OddWidthRowsArePaddedToFourBytesInTheReservedBits)
         rows[4 * i + 2] = 200;
     }
     _DorBitmap bitmap;
+    bitmap.palette.SetSize(2);  // a bitmap handed in with a colour table leaves without one
     VelEmptyCaptureBitmap(bitmap);
-    EXPECT_TRUE(bitmap.bits.GetSize() == 0 && bitmap.info.width == 0 && bitmap.fileSize == 54u && bitmap.info.bitCount == 24);
+    EXPECT_TRUE(bitmap.palette.GetSize() == 0 && bitmap.bits.GetSize() == 0 && bitmap.info.width == 0 && bitmap.fileSize == 54u && bitmap.info.bitCount == 24);
     ASSERT_TRUE(VelReserveCaptureBits(bitmap, 101, 50) && bitmap.bits.GetSize() == 304 * 50);
     const unsigned char* reserved = bitmap.bits.GetData();
     std::fill(bitmap.bits.GetData(), bitmap.bits.GetData() + 304 * 50, 0xAB);

@@ -25,7 +25,7 @@ TEST(RenderState, LightsConvertKindDirectionAndScale)
     DorLight spot, out;
     spot.type = 0;
     spot.position = DorVector3(1, 2, 3);
-    spot.direction = DorVector3(0, 0, -4);
+    spot.direction = DorVector3(0, 3, -4);
     spot.diffuse = DorColorValue(0.5f, 0.25f, 0.125f, 1);
     spot.enabled = 1;
     spot.attenuation = 0.5f;
@@ -33,9 +33,9 @@ TEST(RenderState, LightsConvertKindDirectionAndScale)
         state.SetLight(index, spot, 2.0);
     out.type = 42;
     state.GetLight(3, out, 2.0);
-    EXPECT_TRUE(state.lights[3].kind == 1 && Off(state.lights[3].direction, DorVector3(0, 0, 1)) + Off(state.lights[3].position, DorVector3(2, 4, 6)) < 1e-6);
+    EXPECT_TRUE(state.lights[3].kind == 1 && Off(state.lights[3].direction, DorVector3(0, -0.6, 0.8)) + Off(state.lights[3].position, DorVector3(2, 4, 6)) < 1e-6);
     EXPECT_TRUE(out.type == 0 && out.enabled == 1 && out.attenuation == 0.5f && out.diffuse.g == 0.25f);
-    EXPECT_LE(DorLength(out.position - DorVector3(1, 2, 3)) + DorLength(out.direction - DorVector3(0, 0, -1)), 1e-6);
+    EXPECT_LE(DorLength(out.position - DorVector3(1, 2, 3)) + DorLength(out.direction - DorVector3(0, 0.6, -0.8)), 1e-6);
     spot.type = 1;
     spot.direction = DorVector3(0.00001, 0, 0);
     state.SetLight(2, spot, 1.0);

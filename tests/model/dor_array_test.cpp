@@ -60,7 +60,8 @@ TEST(DorArray, ElementsLiveOnceAcrossRelocationAndAddSurvivesItsOwnElement)
         a.SetSize(500);  // several relocations, bitwise
         EXPECT_TRUE(Tracked::alive == 500 && a[2].value == 99 && a[499].marker == 42);
         a.SetSize(10);
-        EXPECT_EQ(Tracked::alive, 10);
+        a.SetAtGrow(20, a[2]);  // the gap is constructed too
+        EXPECT_TRUE(Tracked::alive == 21 && a[15].marker == 42 && a[20].value == 99);
     }
     EXPECT_EQ(Tracked::alive, 0);
     CDorArray<double, const double&> d;

@@ -22,7 +22,7 @@ TEST(Matrices, RightAnglesAreExactAndTheLeftFactorAppliesFirst)
         {DorRotateX(kPi / 2), {0, 1, 0}, {0, 0, 1}, false},
         {DorRotateY(kPi / 2), {0, 0, 1}, {1, 0, 0}, false},
         {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {0, 0, 0}, {0, 1, 0}, false},  // moved, then turned
-        {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {1, 0, 0}, {0, 1, 0}, true},
+        {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {1, 1, 0}, {-1, 1, 0}, true},
     };
     for (const auto& r : rows) {
         DorVector3 p = r.direction ? DorTransformDirection(r.point, r.m) : DorTransformPoint(r.point, r.m);
