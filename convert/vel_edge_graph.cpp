@@ -16,6 +16,7 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
     spans.reserve(maxEdges > 0 ? maxEdges : 0);
+    units.reserve(maxEdges > 0 ? maxEdges : 0);
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
@@ -32,6 +33,9 @@ void VelEdgeGraph::Append(int start, int end)
 {
     edges.push_back(Edge{start, end, 0, -1, -1});
     spans.push_back(Span{plane[start], VelSub2(plane[end], plane[start])});
+    DorVector2 unit = spans.back().along;
+    VelNormalize2(unit);
+    units.push_back(unit);
 }
 
 void VelEdgeGraph::AddSegment(int i, int j)
@@ -64,20 +68,28 @@ void VelEdgeGraph::AddLoopEdges(int first, int count)
     loopEdgeCount = static_cast<int>(edges.size());
 }
 
-// The appended edges are tried before the loops' own: they are the ones that usually cross.
+// Whether the answer is yes does not depend on the order the edges are tried in. The edge that
+// crossed the last crossing candidate is tried first: the next pair in the search usually
+// crosses it too. Then the appended edges, which usually cross, then the loops' own.
 bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
 {
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
     if (along.x == 0.0 && along.y == 0.0)
         return false;  // every determinant would be 0 (or NaN)
+    auto crosses = [&](int at) {
+        const Edge& e = edges[at];
+        return VelSegmentsCrossAlong(from, along, spans[at].from, spans[at].along) && e.start != i &&
+               e.start != j && e.end != i && e.end != j;
+    };
+    if (lastCrossed >= 0 && crosses(lastCrossed))
+        return true;
     const int count = static_cast<int>(edges.size());
     for (int k = loopEdgeCount; k < count + loopEdgeCount; ++k) {
         const int at = k < count ? k : k - count;
-        const Edge& e = edges[at];
-        if (e.start == i || e.start == j || e.end == i || e.end == j)
-            continue;
-        if (VelSegmentsCrossAlong(from, along, spans[at].from, spans[at].along))
+        if (crosses(at)) {
+            lastCrossed = at;
             return true;
+        }
     }
     return false;
 }
@@ -138,8 +150,8 @@ int VelEdgeGraph::BestNeighbour(int c, int s, const DorVector2& u, bool clockwis
         if (k == c)
             return;
         int x = e.start == s ? e.end : e.start;
-        DorVector2 v = VelSub2(plane[x], plane[s]);
-        VelNormalize2(v);
+        // From the end, the negated unit: the same numbers as normalising P_start - P_end.
+        DorVector2 v = e.start == s ? units[k] : DorVector2(-units[k].x, -units[k].y);
         double cross = VelCross2(u, v);
         if (clockwise ? !(cross < 0.0) : !(cross > 0.0))
             return;
@@ -196,8 +208,7 @@ void VelEdgeGraph::CloseTrianglesOnAddedEdges(bool finishOnOpenRight)
         if (edges[c].sides == (kRightMade | kLeftMade))
             continue;
         int s = edges[c].start, e = edges[c].end;
-        DorVector2 u = VelSub2(plane[e], plane[s]);
-        VelNormalize2(u);
+        const DorVector2 u = units[c];
         if (!(edges[c].sides & kRightMade)) {
             int x = BestNeighbour(c, s, u, true);
             if (x >= 0) {

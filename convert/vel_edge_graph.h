@@ -62,10 +62,12 @@ private:
     int loopEdgeCount = 0;
     std::vector<Edge> edges;
     std::vector<Span> spans;  // per edge
+    std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
     std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none
     // The largest coordinate magnitude, and whether every coordinate is finite.
     double extent = 0.0;
     bool finite = true;
+    mutable int lastCrossed = -1;  // a search hint only: the edge that crossed last
     std::vector<int> candidates;  // three per triangle
 };
