@@ -15,7 +15,8 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 {
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
-    spans.reserve(maxEdges > 0 ? maxEdges : 0);
+    for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
+        column->reserve(maxEdges > 0 ? maxEdges + kBlock : kBlock);
     units.reserve(maxEdges > 0 ? maxEdges : 0);
 }
 
@@ -32,8 +33,16 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
 void VelEdgeGraph::Append(int start, int end)
 {
     edges.push_back(Edge{start, end, 0, -1, -1});
-    spans.push_back(Span{plane[start], VelSub2(plane[end], plane[start])});
-    DorVector2 unit = spans.back().along;
+    const size_t at = edges.size() - 1;
+    if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
+        for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
+            column->resize(at + kBlock, 0.0);
+    }
+    DorVector2 unit = VelSub2(plane[end], plane[start]);
+    fromX[at] = plane[start].x;
+    fromY[at] = plane[start].y;
+    alongX[at] = unit.x;
+    alongY[at] = unit.y;
     VelNormalize2(unit);
     units.push_back(unit);
 }
@@ -68,27 +77,40 @@ void VelEdgeGraph::AddLoopEdges(int first, int count)
     loopEdgeCount = static_cast<int>(edges.size());
 }
 
+// Whether segment from-from+along crosses edge at, which has neither i nor j as an end.
+bool VelEdgeGraph::CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const
+{
+    const Edge& e = edges[at];
+    return VelSegmentsCrossAlong(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at])) &&
+           e.start != i && e.start != j && e.end != i && e.end != j;
+}
+
 // Whether the answer is yes does not depend on the order the edges are tried in. The edge that
 // crossed the last crossing candidate is tried first: the next pair in the search usually
-// crosses it too. Then the appended edges, which usually cross, then the loops' own.
+// crosses it too. Then the edges go by blocks, each screened at once (side by side, without
+// branches) by the test's own first stage; only a block with an edge that may cross is gone
+// through one edge at a time.
 bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
 {
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
     if (along.x == 0.0 && along.y == 0.0)
         return false;  // every determinant would be 0 (or NaN)
-    auto crosses = [&](int at) {
-        const Edge& e = edges[at];
-        return VelSegmentsCrossAlong(from, along, spans[at].from, spans[at].along) && e.start != i &&
-               e.start != j && e.end != i && e.end != j;
-    };
-    if (lastCrossed >= 0 && crosses(lastCrossed))
+    if (lastCrossed >= 0 && CrossesEdge(from, along, i, j, lastCrossed))
         return true;
     const int count = static_cast<int>(edges.size());
-    for (int k = loopEdgeCount; k < count + loopEdgeCount; ++k) {
-        const int at = k < count ? k : k - count;
-        if (crosses(at)) {
-            lastCrossed = at;
-            return true;
+    for (int block = 0; block < count; block += kBlock) {
+        bool may = false;
+        for (int at = block; at < block + kBlock; ++at) {
+            VelCrossingTerms terms(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at]));
+            may |= terms.MayCross();
+        }
+        if (!may)
+            continue;
+        for (int at = block; at < std::min(block + kBlock, count); ++at) {
+            if (CrossesEdge(from, along, i, j, at)) {
+                lastCrossed = at;
+                return true;
+            }
         }
     }
     return false;

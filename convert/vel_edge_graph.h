@@ -43,12 +43,10 @@ private:
         int start, end, sides;
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
-    // An edge's start and its end minus its start, as the crossing test forms them.
-    struct Span {
-        DorVector2 from, along;
-    };
+    static const int kBlock = 8;  // edges screened together by the crossing search
 
     void Append(int start, int end);
+    bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
     // Calls f(k) for every edge k with v as an end, in list order, each once.
     template <typename F>
     void ForEdgesAt(int v, F f) const;
@@ -61,7 +59,9 @@ private:
     int maxEdges;
     int loopEdgeCount = 0;
     std::vector<Edge> edges;
-    std::vector<Span> spans;  // per edge
+    // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
+    // test forms them.
+    std::vector<double> fromX, fromY, alongX, alongY;
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
     std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none

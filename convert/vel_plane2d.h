@@ -20,19 +20,30 @@ void VelNormalize2(DorVector2& v);
 // (cross product exactly 0) never cross.
 bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1);
 
+// The determinant and the numerators of s and t in p0 + s d = a0 + t e.
+struct VelCrossingTerms {
+    double det, sNum, tNum;
+    VelCrossingTerms(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
+    {
+        det = VelCross2(e, d);
+        DorVector2 w = VelSub2(a0, p0);
+        sNum = VelCross2(e, w);
+        tNum = VelCross2(d, w);
+    }
+    // A quotient lies in (0, 1) only when its numerator is smaller than det: without this, the
+    // segments do not cross. Also false for det = 0 and for NaN, as the quotients would be.
+    // Without a branch, so that a loop of such tests runs side by side.
+    bool MayCross() const { return (std::fabs(sNum) < std::fabs(det)) & (std::fabs(tNum) < std::fabs(det)); }
+};
+
 // The same for p0 + d and a0 + e with d = p1 - p0, e = a1 - a0 already formed.
 // Inline: the triangulations call it for every candidate against every listed edge.
 inline bool VelSegmentsCrossAlong(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
 {
-    double det = VelCross2(e, d);
-    // p0 + s d = a0 + t e
-    DorVector2 w = VelSub2(a0, p0);
-    double sNum = VelCross2(e, w), tNum = VelCross2(d, w);
-    // A quotient lies in (0, 1) only when its numerator is smaller than det: most edges are
-    // settled without dividing. Also false for det = 0 and for NaN, as the quotients would be.
-    if (!(std::fabs(sNum) < std::fabs(det) && std::fabs(tNum) < std::fabs(det)))
-        return false;
-    double s = sNum / det, t = tNum / det;
+    VelCrossingTerms terms(p0, d, a0, e);
+    if (!terms.MayCross())
+        return false;  // most edges are settled without dividing
+    double s = terms.sNum / terms.det, t = terms.tNum / terms.det;
     return s > 0.0 && s < 1.0 && t > 0.0 && t < 1.0;
 }
 
