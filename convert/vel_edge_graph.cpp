@@ -85,11 +85,16 @@ bool VelEdgeGraph::CrossesEdge(const DorVector2& from, const DorVector2& along, 
            e.start != i && e.start != j && e.end != i && e.end != j;
 }
 
+bool VelEdgeGraph::CrossesLastCrossed(int i, int j) const
+{
+    const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
+    return lastCrossed >= 0 && CrossesEdge(from, along, i, j, lastCrossed);
+}
+
 // Whether the answer is yes does not depend on the order the edges are tried in. The edge that
-// crossed the last crossing candidate is tried first: the next pair in the search usually
-// crosses it too. Then the edges go by blocks, each screened at once (side by side, without
-// branches) by the test's own first stage; only a block with an edge that may cross is gone
-// through one edge at a time.
+// crossed the last crossing candidate is tried first. Then the edges go by blocks, each
+// screened at once (side by side, without branches) by the test's own first stage; only a block
+// with an edge that may cross is gone through one edge at a time.
 bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
 {
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);

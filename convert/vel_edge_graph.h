@@ -24,6 +24,9 @@ public:
 
     // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
     bool CrossesListedEdge(int i, int j) const;
+    // The same for the one edge that crossed the last crossing segment: the next pair in the
+    // search usually crosses it too, so it is worth a look before dearer tests.
+    bool CrossesLastCrossed(int i, int j) const;
     // Whether some point other than i and j lies on segment i-j.
     bool PassesThroughPoint(int i, int j) const;
 

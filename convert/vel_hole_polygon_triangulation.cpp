@@ -78,14 +78,14 @@ bool HoledTriangulation::MidpointInMaterial(const DorVector2& mid) const
     return true;
 }
 
-// The cheap tests first; all must hold, so the order does not change the result.
+// All tests must hold, so the order does not change the result: the cheap ones first, the
+// midpoint, tested against every loop, last.
 bool HoledTriangulation::Admissible(int i, int j) const
 {
-    if (ClosesLoop(i, j) || graph.CrossesListedEdge(i, j))
+    if (ClosesLoop(i, j) || graph.CrossesLastCrossed(i, j) || graph.PassesThroughPoint(i, j) ||
+        graph.CrossesListedEdge(i, j))
         return false;
-    if (!MidpointInMaterial(VelMidpoint2(graph.plane[i], graph.plane[j])))
-        return false;
-    return !graph.PassesThroughPoint(i, j);
+    return MidpointInMaterial(VelMidpoint2(graph.plane[i], graph.plane[j]));
 }
 
 // Unordered pairs, a vertex's successor in its own loop skipped: each diagonal enters once and

@@ -7,13 +7,15 @@
 namespace {
 const int kAddedEdgeBudget = 100;
 
-// The cheap tests first; all three must hold, so the order does not change the result.
+// All three tests must hold, so the order does not change the result: the cheap ones first,
+// the search through every listed edge last.
 bool Admissible(const VelEdgeGraph& graph, int i, int j)
 {
-    if (graph.CrossesListedEdge(i, j) || graph.PassesThroughPoint(i, j))
+    if (graph.CrossesLastCrossed(i, j) || graph.PassesThroughPoint(i, j))
         return false;
     DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size()));
+    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size())) &&
+           !graph.CrossesListedEdge(i, j);
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter
