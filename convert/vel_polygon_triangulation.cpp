@@ -8,14 +8,13 @@ namespace {
 const int kAddedEdgeBudget = 100;
 
 // All three tests must hold, so the order does not change the result: the cheap ones first,
-// the search through every listed edge last.
+// the midpoint's, which always goes round the whole outline, last.
 bool Admissible(const VelEdgeGraph& graph, int i, int j)
 {
-    if (graph.CrossesLastCrossed(i, j) || graph.PassesThroughPoint(i, j))
+    if (graph.CrossesLastCrossed(i, j) || graph.PassesThroughPoint(i, j) || graph.CrossesListedEdge(i, j))
         return false;
     DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size())) &&
-           !graph.CrossesListedEdge(i, j);
+    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size()));
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter
