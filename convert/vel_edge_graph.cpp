@@ -78,7 +78,7 @@ void VelEdgeGraph::AddLoopEdges(int first, int count)
 }
 
 // Whether segment from-from+along crosses edge at, which has neither i nor j as an end.
-bool VelEdgeGraph::CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const
+inline bool VelEdgeGraph::CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const
 {
     const Edge& e = edges[at];
     return VelSegmentsCrossAlong(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at])) &&
@@ -107,7 +107,7 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
         bool may = false;
         for (int at = block; at < block + kBlock; ++at) {
             VelCrossingTerms terms(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at]));
-            may |= terms.MayCross();
+            may |= terms.MayCrossInside();
         }
         if (!may)
             continue;
@@ -130,22 +130,36 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
     const double lengthSquared = VelDot2(d, d);
     if (lengthSquared == 0.0)
         return false;  // a zero-length segment holds no point
-    const bool screen = finite && extent < 1e150 && lengthSquared > 1e-200;
-    const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
-    for (int k = 0; k < static_cast<int>(plane.size()); ++k) {
-        if (k == i || k == j)
-            continue;
-        if (screen) {
-            DorVector2 w = VelSub2(plane[k], a);
-            double along = VelDot2(w, d);
-            if (!(along > 0.0 && along < lengthSquared))  // t = along / lengthSquared outside (0, 1)
-                continue;
-            double across = VelCross2(w, d);
-            if (across * across > reachSquared * lengthSquared)
-                continue;
+    const int count = static_cast<int>(plane.size());
+    auto onSegment = [&](int k) { return k != i && k != j && VelPointOnSegment(plane[k], a, plane[j]); };
+    if (!(finite && extent < 1e150 && lengthSquared > 1e-200)) {
+        for (int k = 0; k < count; ++k) {
+            if (onSegment(k))
+                return true;
         }
-        if (VelPointOnSegment(plane[k], a, plane[j]))
-            return true;
+        return false;
+    }
+    const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
+    // Across the slab (t = along / lengthSquared in (0, 1)) and near the line; i and j never are.
+    auto near = [&](int k) {
+        DorVector2 w = VelSub2(plane[k], a);
+        double along = VelDot2(w, d), across = VelCross2(w, d);
+        return (along > 0.0) & (along < lengthSquared) & !(across * across > reachSquared * lengthSquared);
+    };
+    // By blocks screened without branches, as in the crossing search.
+    for (int block = 0; block < count; block += kBlock) {
+        const int end = std::min(block + kBlock, count);
+        bool any = end - block < kBlock;
+        if (!any) {
+            for (int k = block; k < end; ++k)
+                any |= near(k);
+        }
+        if (!any)
+            continue;
+        for (int k = block; k < end; ++k) {
+            if (near(k) && onSegment(k))
+                return true;
+        }
     }
     return false;
 }
