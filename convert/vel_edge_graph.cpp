@@ -13,6 +13,7 @@ const int kLeftMade = 2;
 
 VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 {
+    recentlyCrossed.fill(-1);
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
     for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
@@ -85,10 +86,14 @@ inline bool VelEdgeGraph::CrossesEdge(const DorVector2& from, const DorVector2& 
            e.start != i && e.start != j && e.end != i && e.end != j;
 }
 
-bool VelEdgeGraph::CrossesLastCrossed(int i, int j) const
+bool VelEdgeGraph::CrossesRecentlyCrossed(int i, int j) const
 {
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
-    return lastCrossed >= 0 && CrossesEdge(from, along, i, j, lastCrossed);
+    for (int at : recentlyCrossed) {
+        if (at >= 0 && CrossesEdge(from, along, i, j, at))
+            return true;
+    }
+    return false;
 }
 
 // Whether the answer is yes does not depend on the order the edges are tried in. The edge that
@@ -100,8 +105,6 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
     if (along.x == 0.0 && along.y == 0.0)
         return false;  // every determinant would be 0 (or NaN)
-    if (lastCrossed >= 0 && CrossesEdge(from, along, i, j, lastCrossed))
-        return true;
     const int count = static_cast<int>(edges.size());
     for (int block = 0; block < count; block += kBlock) {
         bool may = false;
@@ -113,7 +116,8 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
             continue;
         for (int at = block; at < std::min(block + kBlock, count); ++at) {
             if (CrossesEdge(from, along, i, j, at)) {
-                lastCrossed = at;
+                std::rotate(recentlyCrossed.begin(), recentlyCrossed.end() - 1, recentlyCrossed.end());
+                recentlyCrossed[0] = at;
                 return true;
             }
         }

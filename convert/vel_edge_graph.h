@@ -5,6 +5,7 @@
 //
 // Side marks: bit 1, the triangle to the right of start->end has been made; bit 2, the one to
 // its left. Every closed triangle is counter-clockwise in the plane.
+#include <array>
 #include <vector>
 
 #include "model/dor_types.h"
@@ -24,9 +25,9 @@ public:
 
     // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
     bool CrossesListedEdge(int i, int j) const;
-    // The same for the one edge that crossed the last crossing segment: the next pair in the
-    // search usually crosses it too, so it is worth a look before dearer tests.
-    bool CrossesLastCrossed(int i, int j) const;
+    // The same for the few edges that crossed the last crossing segments: the next pairs in the
+    // search usually cross them too, so they are worth a look before dearer tests.
+    bool CrossesRecentlyCrossed(int i, int j) const;
     // Whether some point other than i and j lies on segment i-j.
     bool PassesThroughPoint(int i, int j) const;
 
@@ -47,6 +48,7 @@ private:
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
     static const int kBlock = 8;  // edges screened together by the crossing search
+    static const int kRecent = 4;
 
     void Append(int start, int end);
     bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
@@ -71,6 +73,7 @@ private:
     // The largest coordinate magnitude, and whether every coordinate is finite.
     double extent = 0.0;
     bool finite = true;
-    mutable int lastCrossed = -1;  // a search hint only: the edge that crossed last
+    // A search hint only: the edges that crossed last, latest first, -1 for none.
+    mutable std::array<int, kRecent> recentlyCrossed;
     std::vector<int> candidates;  // three per triangle
 };

@@ -82,7 +82,7 @@ bool HoledTriangulation::MidpointInMaterial(const DorVector2& mid) const
 // midpoint, tested against every loop, last.
 bool HoledTriangulation::Admissible(int i, int j) const
 {
-    if (ClosesLoop(i, j) || graph.CrossesLastCrossed(i, j) || graph.PassesThroughPoint(i, j) ||
+    if (ClosesLoop(i, j) || graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughPoint(i, j) ||
         graph.CrossesListedEdge(i, j))
         return false;
     return MidpointInMaterial(VelMidpoint2(graph.plane[i], graph.plane[j]));

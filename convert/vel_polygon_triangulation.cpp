@@ -11,7 +11,7 @@ const int kAddedEdgeBudget = 100;
 // the midpoint's, which always goes round the whole outline, last.
 bool Admissible(const VelEdgeGraph& graph, int i, int j)
 {
-    if (graph.CrossesLastCrossed(i, j) || graph.PassesThroughPoint(i, j) || graph.CrossesListedEdge(i, j))
+    if (graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughPoint(i, j) || graph.CrossesListedEdge(i, j))
         return false;
     DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
     return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size()));
