@@ -48,7 +48,7 @@ private:
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
     static const int kBlock = 8;  // edges screened together by the crossing search
-    static const int kRecent = 4;
+    static const int kRecent = 8;
 
     void Append(int start, int end);
     bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
