@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "convert/vel_plane2d.h"
 #include "model/dor_math.h"
@@ -38,6 +39,15 @@ void VelEdgeGraph::Append(int start, int end)
     if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
         for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
             column->resize(at + kBlock, 0.0);
+        const double inf = std::numeric_limits<double>::infinity();
+        blockBoxes.push_back(Box{inf, inf, -inf, -inf});
+    }
+    Box& box = blockBoxes.back();
+    for (int v : {start, end}) {
+        box.minX = std::min(box.minX, plane[v].x);
+        box.minY = std::min(box.minY, plane[v].y);
+        box.maxX = std::max(box.maxX, plane[v].x);
+        box.maxY = std::max(box.maxY, plane[v].y);
     }
     DorVector2 unit = VelSub2(plane[end], plane[start]);
     fromX[at] = plane[start].x;
@@ -106,7 +116,22 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
     if (along.x == 0.0 && along.y == 0.0)
         return false;  // every determinant would be 0 (or NaN)
     const int count = static_cast<int>(edges.size());
+    // A block whose points all lie on one side of the segment's line, farther from it than the
+    // rounding of the test (below 30 ulps of |along.x| + |along.y| times the extent), holds no
+    // crossing edge: for each of its edges t's numerator keeps that side's sign and t's
+    // denominator minus its numerator the other, so t is outside (0, 1).
+    const double reach = std::fabs(along.x) + std::fabs(along.y);
+    const bool boxes = finite && extent < 1e150 && reach * extent > 1e-200;
+    const double margin = 1e-14 * reach * extent;
+    auto oneSide = [&](const Box& box) {
+        bool up = along.x >= 0.0, right = along.y >= 0.0;
+        double least = along.x * ((up ? box.minY : box.maxY) - from.y) - along.y * ((right ? box.maxX : box.minX) - from.x);
+        double most = along.x * ((up ? box.maxY : box.minY) - from.y) - along.y * ((right ? box.minX : box.maxX) - from.x);
+        return least > margin || most < -margin;
+    };
     for (int block = 0; block < count; block += kBlock) {
+        if (boxes && oneSide(blockBoxes[block / kBlock]))
+            continue;
         bool may = false;
         for (int at = block; at < block + kBlock; ++at) {
             VelCrossingTerms terms(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at]));

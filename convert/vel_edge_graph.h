@@ -67,6 +67,10 @@ private:
     // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
     // test forms them.
     std::vector<double> fromX, fromY, alongX, alongY;
+    struct Box {
+        double minX, minY, maxX, maxY;
+    };
+    std::vector<Box> blockBoxes;  // per block: the bounds of its edges' ends
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
     std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none
