@@ -12,6 +12,23 @@ const int kRightMade = 1;
 const int kLeftMade = 2;
 }  // namespace
 
+void VelEdgeGraph::Box::Grow(const DorVector2& p)
+{
+    minX = std::min(minX, p.x);
+    minY = std::min(minY, p.y);
+    maxX = std::max(maxX, p.x);
+    maxY = std::max(maxY, p.y);
+}
+
+// The least and the most of c.x (x - a.x) + c.y (y - a.y) over the box, each rounded in five
+// operations: within 6 ulps of (|c.x| + |c.y|) times twice the extent.
+void VelEdgeGraph::Box::Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const
+{
+    bool xUp = c.x >= 0.0, yUp = c.y >= 0.0;
+    least = c.x * ((xUp ? minX : maxX) - a.x) + c.y * ((yUp ? minY : maxY) - a.y);
+    most = c.x * ((xUp ? maxX : minX) - a.x) + c.y * ((yUp ? maxY : minY) - a.y);
+}
+
 VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 {
     recentlyCrossed.fill(-1);
@@ -26,7 +43,10 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
 {
     for (int k = 0; k < count; ++k) {
         DorVector3 p = DorTransformPoint(points[k], projection);
+        if (plane.size() % kBlock == 0)
+            pointBoxes.push_back(Box());
         plane.push_back(DorVector2(p.x, p.y));
+        pointBoxes.back().Grow(plane.back());
         finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
         extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
     }
@@ -39,16 +59,10 @@ void VelEdgeGraph::Append(int start, int end)
     if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
         for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
             column->resize(at + kBlock, 0.0);
-        const double inf = std::numeric_limits<double>::infinity();
-        blockBoxes.push_back(Box{inf, inf, -inf, -inf});
+        edgeBoxes.push_back(Box());
     }
-    Box& box = blockBoxes.back();
-    for (int v : {start, end}) {
-        box.minX = std::min(box.minX, plane[v].x);
-        box.minY = std::min(box.minY, plane[v].y);
-        box.maxX = std::max(box.maxX, plane[v].x);
-        box.maxY = std::max(box.maxY, plane[v].y);
-    }
+    edgeBoxes.back().Grow(plane[start]);
+    edgeBoxes.back().Grow(plane[end]);
     DorVector2 unit = VelSub2(plane[end], plane[start]);
     fromX[at] = plane[start].x;
     fromY[at] = plane[start].y;
@@ -124,13 +138,12 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
     const bool boxes = finite && extent < 1e150 && reach * extent > 1e-200;
     const double margin = 1e-14 * reach * extent;
     auto oneSide = [&](const Box& box) {
-        bool up = along.x >= 0.0, right = along.y >= 0.0;
-        double least = along.x * ((up ? box.minY : box.maxY) - from.y) - along.y * ((right ? box.maxX : box.minX) - from.x);
-        double most = along.x * ((up ? box.maxY : box.minY) - from.y) - along.y * ((right ? box.minX : box.maxX) - from.x);
+        double least, most;  // of cross(along, p - from)
+        box.Extremes(from, DorVector2(-along.y, along.x), least, most);
         return least > margin || most < -margin;
     };
     for (int block = 0; block < count; block += kBlock) {
-        if (boxes && oneSide(blockBoxes[block / kBlock]))
+        if (boxes && oneSide(edgeBoxes[block / kBlock]))
             continue;
         bool may = false;
         for (int at = block; at < block + kBlock; ++at) {
@@ -169,6 +182,18 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
         return false;
     }
     const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
+    // A block of points all beyond an end of the slab, or farther than reach from the line, by
+    // more than the rounding of the screen below and of the extremes, holds no point near.
+    const double margin = 1e-14 * (std::fabs(d.x) + std::fabs(d.y)) * extent;
+    const double farAcross = reach * 1.000001 * std::sqrt(lengthSquared) + margin;
+    auto away = [&](const Box& box) {
+        double least, most;
+        box.Extremes(a, d, least, most);  // of along
+        if (most < -margin || least > lengthSquared + margin)
+            return true;
+        box.Extremes(a, DorVector2(-d.y, d.x), least, most);  // of -across
+        return least > farAcross || most < -farAcross;
+    };
     // Across the slab (t = along / lengthSquared in (0, 1)) and near the line; i and j never are.
     auto near = [&](int k) {
         DorVector2 w = VelSub2(plane[k], a);
@@ -178,6 +203,8 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
     // By blocks screened without branches, as in the crossing search.
     for (int block = 0; block < count; block += kBlock) {
         const int end = std::min(block + kBlock, count);
+        if (away(pointBoxes[block / kBlock]))
+            continue;
         bool any = end - block < kBlock;
         if (!any) {
             for (int k = block; k < end; ++k)

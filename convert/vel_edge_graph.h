@@ -6,6 +6,7 @@
 // Side marks: bit 1, the triangle to the right of start->end has been made; bit 2, the one to
 // its left. Every closed triangle is counter-clockwise in the plane.
 #include <array>
+#include <limits>
 #include <vector>
 
 #include "model/dor_types.h"
@@ -47,7 +48,13 @@ private:
         int start, end, sides;
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
-    static const int kBlock = 8;  // edges screened together by the crossing search
+    static const int kBlock = 8;  // edges or points screened together
+    // Bounds of a few points; empty at first.
+    struct Box {
+        double minX = std::numeric_limits<double>::infinity(), minY = minX, maxX = -minX, maxY = -minX;
+        void Grow(const DorVector2& p);
+        void Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const;
+    };
     static const int kRecent = 8;
 
     void Append(int start, int end);
@@ -67,10 +74,8 @@ private:
     // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
     // test forms them.
     std::vector<double> fromX, fromY, alongX, alongY;
-    struct Box {
-        double minX, minY, maxX, maxY;
-    };
-    std::vector<Box> blockBoxes;  // per block: the bounds of its edges' ends
+    std::vector<Box> edgeBoxes;  // per block of edges: the bounds of their ends
+    std::vector<Box> pointBoxes;  // per block of points
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
     std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none
