@@ -12,23 +12,6 @@ const int kRightMade = 1;
 const int kLeftMade = 2;
 }  // namespace
 
-void VelEdgeGraph::Box::Grow(const DorVector2& p)
-{
-    minX = std::min(minX, p.x);
-    minY = std::min(minY, p.y);
-    maxX = std::max(maxX, p.x);
-    maxY = std::max(maxY, p.y);
-}
-
-// The least and the most of c.x (x - a.x) + c.y (y - a.y) over the box, each rounded in five
-// operations: within 6 ulps of (|c.x| + |c.y|) times twice the extent.
-void VelEdgeGraph::Box::Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const
-{
-    bool xUp = c.x >= 0.0, yUp = c.y >= 0.0;
-    least = c.x * ((xUp ? minX : maxX) - a.x) + c.y * ((yUp ? minY : maxY) - a.y);
-    most = c.x * ((xUp ? maxX : minX) - a.x) + c.y * ((yUp ? maxY : minY) - a.y);
-}
-
 VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 {
     recentlyCrossed.fill(-1);
@@ -41,12 +24,14 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
 {
+    loopStarts.push_back(LoopStart{static_cast<int>(plane.size()), static_cast<int>(runs.size())});
     for (int k = 0; k < count; ++k) {
         DorVector3 p = DorTransformPoint(points[k], projection);
-        if (plane.size() % kBlock == 0)
-            pointBoxes.push_back(Box());
+        if (k % kBlock == 0)
+            runs.push_back(VelRun{k, k, VelBox()});
         plane.push_back(DorVector2(p.x, p.y));
-        pointBoxes.back().Grow(plane.back());
+        runs.back().end = k + 1;
+        runs.back().box.Grow(plane.back());
         finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
         extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
     }
@@ -59,7 +44,7 @@ void VelEdgeGraph::Append(int start, int end)
     if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
         for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
             column->resize(at + kBlock, 0.0);
-        edgeBoxes.push_back(Box());
+        edgeBoxes.push_back(VelBox());
     }
     edgeBoxes.back().Grow(plane[start]);
     edgeBoxes.back().Grow(plane[end]);
@@ -137,7 +122,7 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
     const double reach = std::fabs(along.x) + std::fabs(along.y);
     const bool boxes = finite && extent < 1e150 && reach * extent > 1e-200;
     const double margin = 1e-14 * reach * extent;
-    auto oneSide = [&](const Box& box) {
+    auto oneSide = [&](const VelBox& box) {
         double least, most;  // of cross(along, p - from)
         box.Extremes(from, DorVector2(-along.y, along.x), least, most);
         return least > margin || most < -margin;
@@ -186,7 +171,7 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
     // more than the rounding of the screen below and of the extremes, holds no point near.
     const double margin = 1e-14 * (std::fabs(d.x) + std::fabs(d.y)) * extent;
     const double farAcross = reach * 1.000001 * std::sqrt(lengthSquared) + margin;
-    auto away = [&](const Box& box) {
+    auto away = [&](const VelBox& box) {
         double least, most;
         box.Extremes(a, d, least, most);  // of along
         if (most < -margin || least > lengthSquared + margin)
@@ -200,24 +185,40 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
         double along = VelDot2(w, d), across = VelCross2(w, d);
         return (along > 0.0) & (along < lengthSquared) & !(across * across > reachSquared * lengthSquared);
     };
-    // By blocks screened without branches, as in the crossing search.
-    for (int block = 0; block < count; block += kBlock) {
-        const int end = std::min(block + kBlock, count);
-        if (away(pointBoxes[block / kBlock]))
-            continue;
-        bool any = end - block < kBlock;
-        if (!any) {
-            for (int k = block; k < end; ++k)
-                any |= near(k);
-        }
-        if (!any)
-            continue;
-        for (int k = block; k < end; ++k) {
-            if (near(k) && onSegment(k))
-                return true;
+    // By runs screened without branches, as in the crossing search.
+    for (size_t l = 0; l < loopStarts.size(); ++l) {
+        const int lastRun = l + 1 < loopStarts.size() ? loopStarts[l + 1].run : static_cast<int>(runs.size());
+        for (int r = loopStarts[l].run; r < lastRun; ++r) {
+            if (away(runs[r].box))
+                continue;
+            const int first = loopStarts[l].point + runs[r].first, end = loopStarts[l].point + runs[r].end;
+            bool any = end - first < kBlock;
+            if (!any) {
+                for (int k = first; k < first + kBlock; ++k)
+                    any |= near(k);
+            }
+            if (!any)
+                continue;
+            for (int k = first; k < end; ++k) {
+                if (near(k) && onSegment(k))
+                    return true;
+            }
         }
     }
     return false;
+}
+
+bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
+{
+    for (size_t l = 0; l < loopStarts.size(); ++l) {
+        const bool last = l + 1 == loopStarts.size();
+        const int end = last ? static_cast<int>(plane.size()) : loopStarts[l + 1].point;
+        if (loopStarts[l].point == first && end == first + count) {
+            const int lastRun = last ? static_cast<int>(runs.size()) : loopStarts[l + 1].run;
+            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loopStarts[l].run, lastRun - loopStarts[l].run);
+        }
+    }
+    return VelInsideLoop(q, plane.data() + first, count);
 }
 
 template <typename F>

@@ -6,9 +6,9 @@
 // Side marks: bit 1, the triangle to the right of start->end has been made; bit 2, the one to
 // its left. Every closed triangle is counter-clockwise in the plane.
 #include <array>
-#include <limits>
 #include <vector>
 
+#include "convert/vel_plane2d.h"
 #include "model/dor_types.h"
 
 class VelEdgeGraph {
@@ -31,6 +31,8 @@ public:
     bool CrossesRecentlyCrossed(int i, int j) const;
     // Whether some point other than i and j lies on segment i-j.
     bool PassesThroughPoint(int i, int j) const;
+    // VelInsideLoop for the points first..first+count-1 as added by one AddProjectedPoints.
+    bool InsideLoop(const DorVector2& q, int first, int count) const;
 
     // Closes the triangles on each side of every appended edge, first to last. With
     // finishOnOpenRight, an edge whose right triangle has a neighbour but lacks a closing edge
@@ -49,12 +51,6 @@ private:
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
     static const int kBlock = 8;  // edges or points screened together
-    // Bounds of a few points; empty at first.
-    struct Box {
-        double minX = std::numeric_limits<double>::infinity(), minY = minX, maxX = -minX, maxY = -minX;
-        void Grow(const DorVector2& p);
-        void Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const;
-    };
     static const int kRecent = 8;
 
     void Append(int start, int end);
@@ -74,8 +70,13 @@ private:
     // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
     // test forms them.
     std::vector<double> fromX, fromY, alongX, alongY;
-    std::vector<Box> edgeBoxes;  // per block of edges: the bounds of their ends
-    std::vector<Box> pointBoxes;  // per block of points
+    std::vector<VelBox> edgeBoxes;  // per block of edges: the bounds of their ends
+    // Each loop's points, as added, cut into runs of a block; their first point and first run.
+    std::vector<VelRun> runs;
+    struct LoopStart {
+        int point, run;
+    };
+    std::vector<LoopStart> loopStarts;
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
     std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none

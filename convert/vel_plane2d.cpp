@@ -115,35 +115,56 @@ bool AcrossQ(const DorVector2& u, const DorVector2& v)
 // either side of the ray's line, that difference is within 1e-11 of -pi when u_m is above the
 // line, +pi otherwise; the term of m itself is computed as the angle sum computes it, within
 // 1e-11 of +-pi. The sum is then within 1e-10 plus its rounding of 2 pi times an integer.
-Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, bool turned)
+// Whether every point of the box lies strictly above, below or behind the ray, as seen, and
+// within magnitudes where no term's products overflow or underflow. Then no edge between two of
+// them crosses the ray, and its two vectors lie in one open half-plane, where the cross
+// product's sign is exact or the angle is below pi / 2: its term is within a few ulps of the
+// exact angle, whatever its size.
+bool Settled(const VelBox& box, const DorVector2& q, bool turned)
+{
+    const double kFar = 1e100, kNear = 1e-100;
+    if (!(std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
+          std::fabs(q.x) < kFar && std::fabs(q.y) < kFar))
+        return false;
+    if (turned)  // seen x is y, seen y is -x
+        return q.x - box.maxX > kNear || box.minX - q.x > kNear || q.y - box.maxY > kNear;
+    return box.minY - q.y > kNear || q.y - box.maxY > kNear || q.x - box.maxX > kNear;
+}
+
+Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, bool turned, const VelRun* runs, int runCount)
 {
     if (count < 3 || count > 1000000)
         return kUnsure;
     const double sumError = count * 1e-14 + static_cast<double>(count) * count * 2e-16;
     int winding = 0, onVertex = -1, onEdge = -1;
-    DorVector2 u = Seen(loop[0], q, turned);
-    for (int k = 0; k < count; ++k) {
-        int next = k + 1 < count ? k + 1 : 0;
-        DorVector2 v = Seen(loop[next], q, turned);
-        if (IsZero(u) || IsZero(v)) {
-            int at = IsZero(u) ? k : next;
-            if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
-                return kUnsure;
-            onVertex = at;
-        } else {
-            int crossing = RayCrossing(u, v, kClear);
-            if (crossing == kUnsure) {
-                if (onEdge >= 0 || !AcrossQ(u, v))
+    for (int r = 0; r < (runs ? runCount : 1); ++r) {
+        const int end = runs ? runs[r].end : count;
+        // A settled run's inner edges add nothing: only the one to the next run is left.
+        int k = !runs ? 0 : Settled(runs[r].box, q, turned) ? end - 1 : runs[r].first;
+        DorVector2 u = Seen(loop[k], q, turned);
+        for (; k < end; ++k) {
+            int next = k + 1 < count ? k + 1 : 0;
+            DorVector2 v = Seen(loop[next], q, turned);
+            if (IsZero(u) || IsZero(v)) {
+                int at = IsZero(u) ? k : next;
+                if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
                     return kUnsure;
-                onEdge = k;
-                // Half a turn each way, as the term and the rest of the loop go round.
-                bool termPositive = EdgeAngle(q, loop[k], loop[next]) > 0.0;
-                winding += (termPositive ? 1 : -1) + (u.y > 0.0 ? -1 : 1);
-                crossing = 0;
+                onVertex = at;
+            } else {
+                int crossing = RayCrossing(u, v, kClear);
+                if (crossing == kUnsure) {
+                    if (onEdge >= 0 || !AcrossQ(u, v))
+                        return kUnsure;
+                    onEdge = k;
+                    // Half a turn each way, as the term and the rest of the loop go round.
+                    bool termPositive = EdgeAngle(q, loop[k], loop[next]) > 0.0;
+                    winding += (termPositive ? 1 : -1) + (u.y > 0.0 ? -1 : 1);
+                    crossing = 0;
+                }
+                winding += crossing * 2;
             }
-            winding += crossing * 2;
+            u = v;
         }
-        u = v;
     }
     if (onVertex >= 0) {
         if (onEdge >= 0)
@@ -159,13 +180,18 @@ Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, b
 }
 }  // namespace
 
-// Where one ray leaves the count unsure (an edge or a vertex along it), the ray a quarter turn
-// round usually does not.
 bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count)
 {
-    Verdict verdict = WindingVerdict(q, loop, count, false);
+    return VelInsideLoop(q, loop, count, nullptr, 0);
+}
+
+// Where one ray leaves the count unsure (an edge or a vertex along it), the ray a quarter turn
+// round usually does not.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount)
+{
+    Verdict verdict = WindingVerdict(q, loop, count, false, runs, runCount);
     if (verdict == kUnsure)
-        verdict = WindingVerdict(q, loop, count, true);
+        verdict = WindingVerdict(q, loop, count, true, runs, runCount);
     if (verdict != kUnsure)
         return verdict == kInside;
     return VelWindingInside(VelWindingAngle(q, loop, count));

@@ -1,7 +1,9 @@
 #pragma once
 // Plane geometry shared by both triangulations. They work on outlines already projected into
 // their own plane (x, y of the plane projection), where counter-clockwise is positive.
+#include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "model/dor_types.h"
 
@@ -62,12 +64,43 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count);
 // The same sum over the loop loop[indices[0..count-1]], for loops that live in a shared list.
 double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int* indices, int count);
 
+// Bounds of a few points; empty at first.
+struct VelBox {
+    double minX = std::numeric_limits<double>::infinity(), minY = minX, maxX = -minX, maxY = -minX;
+    void Grow(const DorVector2& p)
+    {
+        minX = std::min(minX, p.x);
+        minY = std::min(minY, p.y);
+        maxX = std::max(maxX, p.x);
+        maxY = std::max(maxY, p.y);
+    }
+    // The least and the most of c.x (x - a.x) + c.y (y - a.y) over the box, each rounded in
+    // five operations: within 6 ulps of (|c.x| + |c.y|) times the largest coordinate magnitude
+    // of box and a, twice over. Inline: the searches call it for every block.
+    void Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const
+    {
+        bool xUp = c.x >= 0.0, yUp = c.y >= 0.0;
+        least = c.x * ((xUp ? minX : maxX) - a.x) + c.y * ((yUp ? minY : maxY) - a.y);
+        most = c.x * ((xUp ? maxX : minX) - a.x) + c.y * ((yUp ? maxY : minY) - a.y);
+    }
+};
+
+// A run of consecutive points of a loop, first..end-1 counted from the loop's first point,
+// and their bounds.
+struct VelRun {
+    int first, end;
+    VelBox box;
+};
+
 // Whether a winding sum puts its point inside: |sum| > pi.
 bool VelWindingInside(double angleSum);
 
 // VelWindingInside(VelWindingAngle(q, loop, count)), without the angles wherever the winding
 // number alone provably gives the same answer.
 bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count);
+// The same with the loop cut into runs, in order and covering it: the edges within a run whose
+// bounds keep clear of the count's ray and its line are settled together.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount);
 
 // Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
 // vectors from q to the edge's ends is below 0.0001 in magnitude and, once both are normalised,

@@ -14,7 +14,7 @@ bool Admissible(const VelEdgeGraph& graph, int i, int j)
     if (graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughPoint(i, j) || graph.CrossesListedEdge(i, j))
         return false;
     DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size()));
+    return graph.InsideLoop(mid, 0, static_cast<int>(graph.plane.size()));
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter
