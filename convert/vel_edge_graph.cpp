@@ -45,9 +45,14 @@ void VelEdgeGraph::Append(int start, int end)
         for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
             column->resize(at + kBlock, 0.0);
         edgeBoxes.push_back(VelBox());
+        shared.push_back(Shared{start, end});
     }
     edgeBoxes.back().Grow(plane[start]);
     edgeBoxes.back().Grow(plane[end]);
+    for (int* v : {&shared.back().a, &shared.back().b}) {
+        if (*v != start && *v != end)
+            *v = -1;
+    }
     DorVector2 unit = VelSub2(plane[end], plane[start]);
     fromX[at] = plane[start].x;
     fromY[at] = plane[start].y;
@@ -128,6 +133,9 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
         return least > margin || most < -margin;
     };
     for (int block = 0; block < count; block += kBlock) {
+        const Shared& ends = shared[block / kBlock];
+        if (ends.a == i || ends.a == j || ends.b == i || ends.b == j)
+            continue;  // every edge of the block has i or j as an end
         if (boxes && oneSide(edgeBoxes[block / kBlock]))
             continue;
         bool may = false;

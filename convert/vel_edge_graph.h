@@ -71,6 +71,10 @@ private:
     // test forms them.
     std::vector<double> fromX, fromY, alongX, alongY;
     std::vector<VelBox> edgeBoxes;  // per block of edges: the bounds of their ends
+    struct Shared {
+        int a, b;  // points that are an end of every edge of the block, -1 for none
+    };
+    std::vector<Shared> shared;  // per block of edges
     // Each loop's points, as added, cut into runs of a block; their first point and first run.
     std::vector<VelRun> runs;
     struct LoopStart {
