@@ -218,13 +218,14 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
 
 bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
 {
-    for (size_t l = 0; l < loopStarts.size(); ++l) {
-        const bool last = l + 1 == loopStarts.size();
-        const int end = last ? static_cast<int>(plane.size()) : loopStarts[l + 1].point;
-        if (loopStarts[l].point == first && end == first + count) {
-            const int lastRun = last ? static_cast<int>(runs.size()) : loopStarts[l + 1].run;
-            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loopStarts[l].run, lastRun - loopStarts[l].run);
-        }
+    auto loop = std::lower_bound(loopStarts.begin(), loopStarts.end(), first,
+                                 [](const LoopStart& start, int point) { return start.point < point; });
+    if (loop != loopStarts.end() && loop->point == first) {
+        const bool last = loop + 1 == loopStarts.end();
+        const int end = last ? static_cast<int>(plane.size()) : loop[1].point;
+        const int lastRun = last ? static_cast<int>(runs.size()) : loop[1].run;
+        if (end == first + count)
+            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loop->run, lastRun - loop->run);
     }
     return VelInsideLoop(q, plane.data() + first, count);
 }
