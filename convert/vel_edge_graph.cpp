@@ -227,7 +227,7 @@ bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
         if (end == first + count)
             return VelInsideLoop(q, plane.data() + first, count, runs.data() + loop->run, lastRun - loop->run);
     }
-    return VelInsideLoop(q, plane.data() + first, count);
+    return VelInsideLoop(q, plane.data() + first, count, nullptr, 0);
 }
 
 template <typename F>

@@ -180,11 +180,6 @@ Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, b
 }
 }  // namespace
 
-bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count)
-{
-    return VelInsideLoop(q, loop, count, nullptr, 0);
-}
-
 // Where one ray leaves the count unsure (an edge or a vertex along it), the ray a quarter turn
 // round usually does not.
 bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount)

@@ -75,8 +75,8 @@ struct VelBox {
         maxY = std::max(maxY, p.y);
     }
     // The least and the most of c.x (x - a.x) + c.y (y - a.y) over the box, each rounded in
-    // five operations: within 6 ulps of (|c.x| + |c.y|) times the largest coordinate magnitude
-    // of box and a, twice over. Inline: the searches call it for every block.
+    // five operations: within 6 ulps of 2 (|c.x| + |c.y|) m, m the largest coordinate magnitude
+    // of the box and a. Inline: the searches call it for every block.
     void Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const
     {
         bool xUp = c.x >= 0.0, yUp = c.y >= 0.0;
@@ -96,10 +96,9 @@ struct VelRun {
 bool VelWindingInside(double angleSum);
 
 // VelWindingInside(VelWindingAngle(q, loop, count)), without the angles wherever the winding
-// number alone provably gives the same answer.
-bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count);
-// The same with the loop cut into runs, in order and covering it: the edges within a run whose
-// bounds keep clear of the count's ray and its line are settled together.
+// number alone provably gives the same answer. The loop is cut into runs, in order and covering
+// it (or runs is null): the edges within a run whose bounds keep clear of the count's ray and its
+// line are settled together.
 bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount);
 
 // Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
