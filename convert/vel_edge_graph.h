@@ -50,8 +50,8 @@ private:
         int start, end, sides;
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
-    static const int kBlock = 8;  // edges or points screened together
-    static const int kRecent = 8;
+    static constexpr int kBlock = 8;  // edges or points screened together
+    static constexpr int kRecent = 8;
 
     void Append(int start, int end);
     bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
