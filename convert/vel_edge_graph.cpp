@@ -20,6 +20,8 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
     for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
         column->reserve(maxEdges > 0 ? maxEdges + kBlock : kBlock);
     units.reserve(maxEdges > 0 ? maxEdges : 0);
+    edgeBoxes.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
+    shared.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
