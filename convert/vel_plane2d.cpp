@@ -115,15 +115,15 @@ bool AcrossQ(const DorVector2& u, const DorVector2& v)
 // either side of the ray's line, that difference is within 1e-11 of -pi when u_m is above the
 // line, +pi otherwise; the term of m itself is computed as the angle sum computes it, within
 // 1e-11 of +-pi. The sum is then within 1e-10 plus its rounding of 2 pi times an integer.
-// Whether every point of the box lies strictly above, below or behind the ray, as seen, and
-// within magnitudes where no term's products overflow or underflow. Then no edge between two of
-// them crosses the ray, and its two vectors lie in one open half-plane, where the cross
+// Whether every point of the box is finite and lies strictly above, below or behind the ray, as
+// seen, and within magnitudes where no term's products overflow or underflow. Then no edge
+// between two of them crosses the ray, and its two vectors lie in one open half-plane, where the cross
 // product's sign is exact or the angle is below pi / 2: its term is within a few ulps of the
 // exact angle, whatever its size.
 bool Settled(const VelBox& box, const DorVector2& q, bool turned)
 {
     const double kFar = 1e100, kNear = 1e-100;
-    if (!(std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
+    if (!box.finite || !(std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
           std::fabs(q.x) < kFar && std::fabs(q.y) < kFar))
         return false;
     if (turned)  // seen x is y, seen y is -x

@@ -64,11 +64,13 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count);
 // The same sum over the loop loop[indices[0..count-1]], for loops that live in a shared list.
 double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int* indices, int count);
 
-// Bounds of a few points; empty at first.
+// Bounds of a few points; empty at first. The bounds leave out NaN: finite tells.
 struct VelBox {
     double minX = std::numeric_limits<double>::infinity(), minY = minX, maxX = -minX, maxY = -minX;
+    bool finite = true;  // whether every point is
     void Grow(const DorVector2& p)
     {
+        finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
         minX = std::min(minX, p.x);
         minY = std::min(minY, p.y);
         maxX = std::max(maxX, p.x);
