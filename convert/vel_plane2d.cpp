@@ -109,17 +109,11 @@ bool AcrossQ(const DorVector2& u, const DorVector2& v)
            (u.y > 0.0) != (v.y > 0.0);
 }
 
-// One edge m with q on it may be left out of the count: the rest of the loop runs from v_m round
-// to u_m, so its exact angles add up to phi(u_m) - phi(v_m) + 2 pi C, C its signed crossings of
-// the ray and phi measured from the ray in [0, 2 pi). With u_m and v_m nearly opposite and on
-// either side of the ray's line, that difference is within 1e-11 of -pi when u_m is above the
-// line, +pi otherwise; the term of m itself is computed as the angle sum computes it, within
-// 1e-11 of +-pi. The sum is then within 1e-10 plus its rounding of 2 pi times an integer.
 // Whether every point of the box is finite and lies strictly above, below or behind the ray, as
 // seen, and within magnitudes where no term's products overflow or underflow. Then no edge
-// between two of them crosses the ray, and its two vectors lie in one open half-plane, where the cross
-// product's sign is exact or the angle is below pi / 2: its term is within a few ulps of the
-// exact angle, whatever its size.
+// between two of them crosses the ray, and its two vectors lie in one open half-plane, where
+// the cross product's sign is exact or the angle is below pi / 2: its term is within a few ulps
+// of the exact angle, whatever its size.
 bool Settled(const VelBox& box, const DorVector2& q, bool turned)
 {
     const double kFar = 1e100, kNear = 1e-100;
@@ -131,6 +125,12 @@ bool Settled(const VelBox& box, const DorVector2& q, bool turned)
     return box.minY - q.y > kNear || q.y - box.maxY > kNear || q.x - box.maxX > kNear;
 }
 
+// One edge m with q on it may be left out of the count: the rest of the loop runs from v_m round
+// to u_m, so its exact angles add up to phi(u_m) - phi(v_m) + 2 pi C, C its signed crossings of
+// the ray and phi measured from the ray in [0, 2 pi). With u_m and v_m nearly opposite and on
+// either side of the ray's line, that difference is within 1e-11 of -pi when u_m is above the
+// line, +pi otherwise; the term of m itself is computed as the angle sum computes it, within
+// 1e-11 of +-pi. The sum is then within 1e-10 plus its rounding of 2 pi times an integer.
 Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, bool turned, const VelRun* runs, int runCount)
 {
     if (count < 3 || count > 1000000)
