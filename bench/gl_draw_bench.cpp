@@ -32,7 +32,7 @@ int main()
     Win32BenchResult bare = Win32Bench("bare glDrawElements loop, same arrays", runs, [&] {
         glClear(GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
         for (_DorPosition* p = karvel.model.entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p)) {
-            const CVelGLTrianglePolygons& g = CVelGLStructure::EntityAt(p)->groups[0];
+            const CVelGLTrianglePolygons& g = CVelGLStructure::ListedEntity(p)->groups[0];
             glVertexPointer(3, GL_FLOAT, 0, g.positions.GetData());
             glNormalPointer(GL_FLOAT, 0, g.normals.GetData());
             glDrawElements(GL_TRIANGLES, g.indices.GetSize(), GL_UNSIGNED_INT, g.indices.GetData());

@@ -9,7 +9,10 @@ _VelCamera VelGlideCamera(const _VelCamera& from, const _VelCamera& to, double d
 {
     const double k = -1.0 / (duration * duration);
     const double remaining = duration - elapsed;
-    const double f = k * (remaining * remaining) + 1.0;
+    double f = k * (remaining * remaining) + 1.0;
+    // A duration whose square underflows makes k infinite; the quotient form stays exact.
+    if (!std::isfinite(f))
+        f = 1.0 - (remaining / duration) * (remaining / duration);
     _VelCamera camera = from;
     camera.eye = from.eye + (to.eye - from.eye) * f;
     camera.target = from.target + (to.target - from.target) * f;

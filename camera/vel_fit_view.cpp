@@ -29,6 +29,22 @@ double NarrowerHalfTangent(const _VelCamera& camera)
     return t;
 }
 
+bool BoxIsFinite(const DorVector3& low, const DorVector3& high)
+{
+    const double corners[] = {low.x, low.y, low.z, high.x, high.y, high.z};
+    for (double v : corners)
+        if (!std::isfinite(v))
+            return false;
+    return true;
+}
+
+// A box too large for doubles makes an infinite sphere: such a fit is refused whole.
+void Commit(_VelCamera& camera, const _VelCamera& fitted)
+{
+    if (VelCameraIsFinite(fitted))
+        camera = fitted;
+}
+
 // Eye on the view line through the sphere's centre at distance, never closer than the near
 // plane allows, with zFar reaching past the sphere.
 void PlaceOnViewLine(_VelCamera& camera, const DorVector3& forward, const Sphere& sphere, double distance)
@@ -74,17 +90,21 @@ void CVelMathCamera::FitViewToSphere(_VelCamera& camera, const DorVector3& low, 
 {
     DorVector3 forward;
     double tangent = NarrowerHalfTangent(camera);
-    if (!Forward(camera, forward) || tangent <= 0.0)
+    if (!BoxIsFinite(low, high) || !Forward(camera, forward) || tangent <= 0.0)
         return;
     Sphere sphere = SphereAround(low, high);
     double distance = DorLength(camera.target - camera.eye);
     if (sphere.radius >= 0.0001)
         distance = sphere.radius * std::sqrt(1.0 + tangent * tangent) / tangent;  // radius / sin
-    PlaceOnViewLine(camera, forward, sphere, distance);
+    _VelCamera fitted = camera;
+    PlaceOnViewLine(fitted, forward, sphere, distance);
+    Commit(camera, fitted);
 }
 
 void CVelMathCamera::FitViewToBox(_VelCamera& camera, const DorVector3& low, const DorVector3& high)
 {
+    if (!BoxIsFinite(low, high))
+        return;
     FitViewToSphere(camera, low, high);
     DorVector3 forward;
     double tangent = std::tan(camera.fovy * 0.5 / 180.0 * DorPi);
@@ -104,7 +124,7 @@ void CVelMathCamera::FitViewToBox(_VelCamera& camera, const DorVector3& low, con
         double needed = depth * std::fmax(std::fabs(x) / camera.aspect, std::fabs(y));
         shift = std::fmax(shift, needed - depth);
     }
-    double distance = DorLength(camera.target - camera.eye) + shift;
-    if (std::isfinite(distance))
-        PlaceOnViewLine(camera, forward, sphere, distance);
+    _VelCamera fitted = camera;
+    PlaceOnViewLine(fitted, forward, sphere, DorLength(camera.target - camera.eye) + shift);
+    Commit(camera, fitted);
 }

@@ -157,9 +157,10 @@ int CVelMathCamera::ViewportZoom(const _VelCamera& camera, _VelViewport& viewpor
         y0 = y1 - fitH;
 
     // No single zoom magnifies more than five times. A negative scale only comes from a negative
-    // aspect and is refused too, as is a result that no int holds.
+    // aspect and is refused too (-0 from an aspect of -inf included), as is a result that no int
+    // holds.
     const double scale = vw / fitW;
-    if (!(scale >= 0.0 && scale <= 5.0))
+    if (!(scale >= 0.0 && scale <= 5.0) || std::signbit(scale))
         return 0;
     const double bottom = vy + vh - y0 - fitH;  // window rows below the box, y counted upward
     _VelViewport zoomed;

@@ -58,7 +58,8 @@ public:
     /// window pixels, y down) fill the window, fitted to the camera's aspect. Returns 1 and
     /// replaces viewport, or 0 for a rectangle without width or height after clamping to the
     /// viewport, or one that would magnify more than 5 times (viewport width and height may then
-    /// already hold the clamped rectangle's size: callers discard it).
+    /// already hold the clamped rectangle's size: callers discard it). Also 0 for a negative scale,
+    /// which only a negative aspect gives, and for a result that no int holds.
     static int ViewportZoom(const _VelCamera& camera, _VelViewport& viewport, DorVector2 corner0, DorVector2 corner1);
 
     /// point: pixels from the viewport centre, y up; viewHeight: the viewport's height in pixels.
@@ -72,7 +73,7 @@ public:
     /// allows. Blocks the calling thread (the modeller's) and dispatches no messages meanwhile.
     /// Stops a frame short of `to`: set `to` afterwards to end exactly on it. fovy, zNear, zFar
     /// and aspect stay from's. A null modeler, a duration of 0 or not finite does nothing; a
-    /// negative one draws nothing.
+    /// negative one draws nothing. A frame that is not finite is drawn but not set.
     static void AnimationCamera_Sec(CVelKarvel* modeler, _VelCamera from, _VelCamera to, double duration, HDC dc);
 
     /// Orbits modeler's camera about its target, degreesPerSecond counter-clockwise seen from
@@ -86,7 +87,8 @@ public:
     /// Fit-all placements of a camera on the axis-aligned box low..high (model units). Both keep
     /// the direction of view, the field of view and zNear, aim at the box centre and move the eye
     /// along the view line; a camera that cannot be fitted (no direction, a field of view outside
-    /// 0..180 degrees) is left as it was.
+    /// 0..180 degrees) is left as it was, as is every camera on a box with a corner that is not
+    /// finite; a fit that would not be finite (a box too large for doubles) is refused whole.
     /// - FitViewToSphere: the sphere around the box touches the narrower of the vertical and
     ///   horizontal field of view. A box without extent keeps the eye's distance.
     /// - FitViewToBox: tighter: the box corners, projected by GetPerspectiveMatrix, touch the

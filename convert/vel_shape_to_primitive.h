@@ -11,6 +11,10 @@
 /// groups; bare polygons, null entries, unknown kinds and styles are skipped silently. Failures
 /// show only as missing groups. Reentrant: conversions share nothing and may run on any thread,
 /// as long as no two of them touch the same shape.
+///
+/// Coordinates, texture axes and scales that are NaN or infinite are not refused here: they
+/// convert without undefined behaviour, into groups whose vertices may be NaN or infinite, or into
+/// fewer groups. Indices always lie within their group's vertices.
 class KARVEL_API CVelShapeToPrimitive {
 public:
     ///@{
@@ -36,3 +40,10 @@ protected:
     /// CVelHoleExtrudedToPrimitive::ConvertHoleExtruded on a local converter.
     void ConvertHoleExtruded(CDorHoleExtruded* extruded, CVelGroupArray& groups);
 };
+
+/// @cond KARVEL_INTERNAL
+// Whether every point and texture vector of the extrusions of shape (the geometries it converts;
+// of holed profiles the vectors the holed converters read) is finite. Null entries and other
+// kinds are not read.
+bool VelShapeIsFinite(const CDorShape& shape);
+/// @endcond

@@ -46,6 +46,7 @@ void LookAtPixels(const _VelViewport& viewport, double fovyDegrees)
 
 void CVelGLKarvel::DrawModel(HDC& dc)
 {
+    CheckDrawing("DrawModel");
     if (!renderState)
         return;
     renderState->drawScale = modelScale;
@@ -55,7 +56,7 @@ void CVelGLKarvel::DrawModel(HDC& dc)
     SetUpScene();
     BeginEntityPass();
     for (_DorPosition* p = model.entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p)) {
-        const CVelGLEntity* entity = CVelGLStructure::EntityAt(p);
+        const CVelGLEntity* entity = CVelGLStructure::ListedEntity(p);
         if (entity && !(entity->DrawMode & 1))
             DrawEntity(*entity);
     }

@@ -10,6 +10,7 @@
 
 void CVelGLKarvel::HitTest(HDC, int x, int y, CDorArray<_VelSelect, _VelSelect&>& hits)
 {
+    CheckDrawing("HitTest");
     if (!renderState)
         return;
     const DorColorValue& background = context.background;
@@ -36,7 +37,7 @@ void CVelGLKarvel::HitTest(HDC, int x, int y, CDorArray<_VelSelect, _VelSelect&>
     std::vector<_DorPosition*> pushed;
     BeginEntityPass();
     for (_DorPosition* p = model.entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p)) {
-        const CVelGLEntity* entity = CVelGLStructure::EntityAt(p);
+        const CVelGLEntity* entity = CVelGLStructure::ListedEntity(p);
         if (!entity || !(entity->DrawMode & 2))
             continue;
         glPushName(static_cast<GLuint>(pushed.size()));
@@ -60,6 +61,7 @@ void CVelGLKarvel::HitTest(HDC, int x, int y, CDorArray<_VelSelect, _VelSelect&>
 
 void CVelGLKarvel::GetDepthToPoint3(HDC, int x, int y, double& depth, DorVector3& point)
 {
+    CheckDrawing("GetDepthToPoint3");
     if (!renderState)
         return;
     LoadViewingTransform();

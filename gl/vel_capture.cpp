@@ -1,5 +1,6 @@
 #include "gl/vel_capture.h"
 
+#include <climits>
 #include <cstring>
 #include <new>
 
@@ -19,10 +20,23 @@ void VelBeginCaptureBitmap(_DorBitmap& bitmap)
     bitmap.info = DorBitmapInfoHeader{40, 0, 0, 1, 24, 0, 0, 0, 0, 0, 0};
 }
 
+namespace {
+// 24-bit rows padded to 4 bytes, times height, in a width that cannot overflow; -1 when the
+// count is not positive or no int holds it.
+long long CaptureBytes(int width, int height)
+{
+    const long long bytes = (static_cast<long long>(width) * 3 + 3) / 4 * 4 * height;
+    return width > 0 && height > 0 && bytes <= INT_MAX ? bytes : -1;
+}
+}  // namespace
+
 bool VelReserveCaptureBits(_DorBitmap& bitmap, int width, int height)
 {
+    const long long bytes = CaptureBytes(width, height);
+    if (bytes < 0)
+        return false;
     try {
-        bitmap.bits.SetSize(DorBitmapRowBytes(width, 24) * height);
+        bitmap.bits.SetSize(static_cast<int>(bytes));
     } catch (const std::bad_alloc&) {
         return false;
     }
@@ -39,8 +53,13 @@ void VelEmptyCaptureBitmap(_DorBitmap& bitmap)
 
 void VelCompleteCaptureBitmap(_DorBitmap& bitmap, int width, int height, const unsigned char* rows32)
 {
-    const int rowBytes = DorBitmapRowBytes(width, 24);
-    const int pixelBytes = rowBytes * height;
+    const long long bytes = CaptureBytes(width, height);
+    if (bytes < 0) {
+        VelEmptyCaptureBitmap(bitmap);
+        return;
+    }
+    const int pixelBytes = static_cast<int>(bytes);
+    const int rowBytes = pixelBytes / height;
     bitmap.info.bitCount = 24;
     bitmap.info.width = width;
     bitmap.info.height = height;

@@ -18,7 +18,8 @@ bool VelCaptureSizeAllowed(int width, int height, int maxWidth, int maxHeight);
 void VelBeginCaptureBitmap(_DorBitmap& bitmap);
 
 // Sizes bitmap's pixel array for a width x height capture ahead of the rendering; false when the
-// memory cannot be had (the array is then left as it was).
+// memory cannot be had, when a size is not positive, or when the pixel bytes would not fit in an
+// int (the array is then left as it was).
 bool VelReserveCaptureBits(_DorBitmap& bitmap, int width, int height);
 
 // Completes an empty capture: no pixels, no palette, width and height 0, file size 54.
@@ -26,5 +27,5 @@ void VelEmptyCaptureBitmap(_DorBitmap& bitmap);
 
 // Completes the capture of width x height pixels from bottom-up 32-bit rows (blue, green, red,
 // unused; 4 x width bytes each): 24-bit rows padded to 4 bytes with zeros, file size pixel bytes
-// + 54, no palette.
+// + 54, no palette. A size that VelReserveCaptureBits refuses gives the empty capture.
 void VelCompleteCaptureBitmap(_DorBitmap& bitmap, int width, int height, const unsigned char* rows32);

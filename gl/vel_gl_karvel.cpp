@@ -2,7 +2,10 @@
 // camera, cull mode, background and offset.
 #include "gl/vel_gl_karvel.h"
 
+#include <string>
+
 #include "camera/vel_math_camera.h"
+#include "gl/vel_misuse.h"
 
 CVelGLKarvel::CVelGLKarvel(const CVelGLKarvel& other)
     : CVelKarvel(other), model(other.model), renderState(nullptr), context(other.context), modelScale(other.modelScale)
@@ -20,17 +23,39 @@ CVelGLKarvel& CVelGLKarvel::operator=(const CVelGLKarvel& other)
     return *this;
 }
 
-void CVelGLKarvel::RemoveShapeAt(_DorPosition*& position) { model.RemoveAt(position); }
+void CVelGLKarvel::CheckThread(const char* operation) const
+{
+    if (renderState)
+        VelCheckThread(renderState->ownerThread, operation);
+}
 
-void CVelGLKarvel::RemoveShapeAll() { model.Destroy(); }
+void CVelGLKarvel::RemoveShapeAt(_DorPosition*& position)
+{
+    CheckThread("RemoveShapeAt");
+    model.RemoveAt(position);
+}
 
-void CVelGLKarvel::MoveDepthToTail(_DorPosition*& position) { model.MoveToTail(position); }
+void CVelGLKarvel::RemoveShapeAll()
+{
+    CheckThread("RemoveShapeAll");
+    model.Destroy();
+}
 
-void CVelGLKarvel::MoveDepthToHead(_DorPosition*& position) { model.MoveToHead(position); }
+void CVelGLKarvel::MoveDepthToTail(_DorPosition*& position)
+{
+    CheckThread("MoveDepthToTail");
+    model.MoveToTail(position);
+}
+
+void CVelGLKarvel::MoveDepthToHead(_DorPosition*& position)
+{
+    CheckThread("MoveDepthToHead");
+    model.MoveToHead(position);
+}
 
 CDorArray<long, long>* CVelGLKarvel::GetFreeProperty(_DorPosition*& position)
 {
-    CVelGLEntity* entity = CVelGLStructure::EntityAt(position);
+    CVelGLEntity* entity = model.EntityAt(position);
     return entity ? &entity->freeProperty : nullptr;
 }
 
@@ -65,6 +90,9 @@ void CVelGLKarvel::GetCamera(_VelCamera& camera)
 
 void CVelGLKarvel::SetCamera(const _VelCamera& camera)
 {
+    CheckThread("SetCamera");
+    if (!VelCameraIsFinite(camera))
+        VelReportMisuse("SetCamera with a non-finite camera");
     if (renderState)
         renderState->SetCamera(camera, modelScale);
 }
@@ -127,12 +155,14 @@ void CVelGLKarvel::FollowViewportAspect()
 
 _DorPosition* CVelGLKarvel::AddPrimitive(CVelPrimitive& primitive)
 {
+    CheckThread("AddPrimitive");
     CVelGLScope scope(renderState);
     return model.AddPrimitive(primitive, scope);
 }
 
 void CVelGLKarvel::ChangePrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags)
 {
+    CheckThread("ChangePrimitive");
     CVelGLScope scope(renderState);
     model.ChangePrimitive(position, primitive, flags, scope);
 }
@@ -145,25 +175,44 @@ void CVelGLKarvel::GetPrimitive(_DorPosition* position, CVelPrimitive& primitive
 
 void CVelGLKarvel::MoveShape(_DorPosition* position, DorMatrix4x4& matrix)
 {
+    CheckThread("MoveShape");
     CVelGLScope scope(renderState);
     model.MoveEntity(position, matrix, scope);
 }
 
 long CVelGLKarvel::GetDrawMode(_DorPosition*& position)
 {
-    CVelGLEntity* entity = CVelGLStructure::EntityAt(position);
+    CVelGLEntity* entity = model.EntityAt(position);
     return entity ? entity->DrawMode : -1;
 }
 
 void CVelGLKarvel::SetDrawMode(_DorPosition*& position, long mode)
 {
-    if (CVelGLEntity* entity = CVelGLStructure::EntityAt(position))
+    CheckThread("SetDrawMode");
+    if (CVelGLEntity* entity = model.EntityAt(position))
         entity->DrawMode = mode;
 }
 
-unsigned int CVelGLKarvel::AddTexture(_DorBitmap& bitmap) { return model.AddTexture(bitmap); }
+namespace {
+// A texture stored while a context is live reaches OpenGL only at the next context start-up.
+template <class Result>
+Result UploadedLater(Result stored, const CVelGLRenderState* renderState, const char* operation)
+{
+    if (stored && renderState && VelCheckedMode())
+        VelReportMisuse((std::string(operation) + " while live: the image waits for the next Initialize or SetCurrent").c_str());
+    return stored;
+}
+}  // namespace
 
-int CVelGLKarvel::ChangeTexture(unsigned int name, _DorBitmap& bitmap) { return model.ChangeTexture(name, bitmap); }
+unsigned int CVelGLKarvel::AddTexture(_DorBitmap& bitmap)
+{
+    return UploadedLater(model.AddTexture(bitmap), renderState, "AddTexture");
+}
+
+int CVelGLKarvel::ChangeTexture(unsigned int name, _DorBitmap& bitmap)
+{
+    return UploadedLater(model.ChangeTexture(name, bitmap), renderState, "ChangeTexture");
+}
 
 void CVelGLKarvel::RemoveAllTexture() { model.RemoveAllTexture(); }
 

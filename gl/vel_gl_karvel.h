@@ -91,11 +91,11 @@ public:
 
     /// Transforms the entity's stored vertices by matrix in place (row vectors, translation in
     /// row 3, model units): normals turn without translation and are renormalised. Hides
-    /// CVelKarvel::MoveShape, which also translates normals.
+    /// CVelKarvel::MoveShape, which also translates normals. A handle that is not live is refused.
     void MoveShape(_DorPosition* position, DorMatrix4x4& matrix);
-    /// The entity's DrawMode, or -1 when the handle holds no entity.
+    /// The entity's DrawMode, or -1 for a handle that is not live.
     long GetDrawMode(_DorPosition*& position);
-    /// Sets the entity's DrawMode (value 1 hidden, 2 pickable); nothing for an empty handle.
+    /// Sets the entity's DrawMode (value 1 hidden, 2 pickable); a handle that is not live is refused.
     void SetDrawMode(_DorPosition*& position, long mode);
 
 protected:
@@ -121,6 +121,11 @@ protected:
     void DrawGroup(const CVelGLTrianglePolygons& group);
 
 private:
+    // Checked mode: reports operation when called from another thread than the initialising one
+    // (no report before Initialize); CheckDrawing also when the modeller's context is not the
+    // current one.
+    void CheckThread(const char* operation) const;
+    void CheckDrawing(const char* operation) const;
     // The re-creation of the context on dc shared by both Initialize forms; viewport may be null.
     int InitializeOn(HDC dc, const _VelViewport* viewport);
     void DrawArrays(const CVelGLTrianglePolygons& group);

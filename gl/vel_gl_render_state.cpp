@@ -36,7 +36,7 @@ bool InRange(int index) { return index >= 0 && index < VelLightCount; }
 
 CVelGLRenderState::CVelGLRenderState(CVelGLStructure& model_)
     : model(&model_), viewport{0, 0, 0, 0}, resetViewport{0, 0, 0, 0}, cullMode(0), depthTest(1), lighting(1),
-      blending(1), shadeModel(kGLSmooth), drawScale(1.0)
+      blending(1), shadeModel(kGLSmooth), drawScale(1.0), ownerThread(0)
 {
     // A three-quarter view of the origin from the front right, above the ground.
     camera.eye = DorVector3(100, -100, 100);

@@ -43,6 +43,7 @@ public:
     int blending;   ///< 1: alpha blending on at start-up.
     int shadeModel;     ///< GL_SMOOTH.
     double drawScale;  ///< The modeller's model scale, copied before each frame.
+    unsigned long ownerThread;  ///< The thread that initialised the modeller last (checked mode).
 
     /// The defaults: a camera from (100, -100, 100) at the origin, fovy 45, clip 1 to 10000;
     /// zero viewports until start-up; the default lights; back faces culled.

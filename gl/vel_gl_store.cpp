@@ -1,6 +1,14 @@
 #include "gl/vel_gl_store.h"
 
+#include <unordered_set>
+
+#include "gl/vel_misuse.h"
 #include "model/dor_math.h"
+
+class CVelGLLiveHandles {
+public:
+    std::unordered_set<const _DorPosition*> handles;
+};
 
 namespace {
 int KnownRenderKind(int kind) { return kind == VelRenderVertexColour || kind == VelRenderTextured ? kind : VelRenderLit; }
@@ -178,10 +186,10 @@ void CVelGLEntity::Convert(const CVelPrimitive& primitive, double scale)
         groups[i].Convert(primitive.groups[i], scale);
 }
 
-CVelGLStructure::CVelGLStructure() : entities(10) {}
+CVelGLStructure::CVelGLStructure() : entities(10), live(new CVelGLLiveHandles) {}
 
 CVelGLStructure::CVelGLStructure(const CVelGLStructure& other)
-    : entities(10), textures(other.textures), offset(other.offset)
+    : entities(10), textures(other.textures), offset(other.offset), live(new CVelGLLiveHandles)
 {
     CopyEntitiesFrom(other);
 }
@@ -201,25 +209,42 @@ CVelGLStructure::~CVelGLStructure()
 {
     Destroy();
     RemoveAllTexture();
+    delete live;
+}
+
+_DorPosition* CVelGLStructure::Listed(_DorPosition* position)
+{
+    live->handles.insert(position);
+    return position;
 }
 
 void CVelGLStructure::CopyEntitiesFrom(const CVelGLStructure& other)
 {
     for (_DorPosition* p = other.entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p))
-        if (const CVelGLEntity* entity = EntityAt(p))
-            entities.AddTail(new CVelGLEntity(*entity));
+        if (const CVelGLEntity* entity = ListedEntity(p))
+            Listed(entities.AddTail(new CVelGLEntity(*entity)));
 }
 
 void CVelGLStructure::Destroy()
 {
     for (_DorPosition* p = entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p))
-        delete EntityAt(p);
+        delete ListedEntity(p);
     entities.RemoveAll();
+    live->handles.clear();
 }
 
-CVelGLEntity* CVelGLStructure::EntityAt(_DorPosition* position)
+bool CVelGLStructure::IsLive(const _DorPosition* position) const
 {
-    return position ? static_cast<CVelGLEntity*>(CDorList::GetAt(position)) : nullptr;
+    return position && live->handles.count(position) != 0;
+}
+
+CVelGLEntity* CVelGLStructure::EntityAt(_DorPosition* position) const
+{
+    if (IsLive(position))
+        return ListedEntity(position);
+    if (position)
+        VelReportMisuse("a handle that is not live in this modeller (removed, emptied, another's or never issued)");
+    return nullptr;
 }
 
 _DorPosition* CVelGLStructure::AddPrimitive(const CVelPrimitive& primitive, const CVelGLScope& scope)
@@ -227,7 +252,7 @@ _DorPosition* CVelGLStructure::AddPrimitive(const CVelPrimitive& primitive, cons
     CVelGLEntity* entity = new CVelGLEntity;
     entity->Convert(primitive, scope.vertexScale);
     entity->DrawMode = primitive.DrawMode;
-    return entities.AddTail(entity);
+    return Listed(entities.AddTail(entity));
 }
 
 void CVelGLStructure::ChangePrimitive(_DorPosition* position, const CVelPrimitive& primitive, long flags,
@@ -289,6 +314,7 @@ void CVelGLStructure::RemoveAt(_DorPosition*& position)
     CVelGLEntity* entity = EntityAt(position);
     if (!entity)
         return;
+    live->handles.erase(position);
     entities.RemoveAt(position);
     delete entity;
     position = nullptr;
@@ -296,14 +322,20 @@ void CVelGLStructure::RemoveAt(_DorPosition*& position)
 
 void CVelGLStructure::MoveToHead(_DorPosition*& position)
 {
-    if (EntityAt(position))
-        entities.MoveToHead(position);
+    if (!EntityAt(position))
+        return;
+    live->handles.erase(position);
+    entities.MoveToHead(position);
+    Listed(position);
 }
 
 void CVelGLStructure::MoveToTail(_DorPosition*& position)
 {
-    if (EntityAt(position))
-        entities.MoveToTail(position);
+    if (!EntityAt(position))
+        return;
+    live->handles.erase(position);
+    entities.MoveToTail(position);
+    Listed(position);
 }
 
 void CVelGLStructure::MoveEntity(_DorPosition* position, const DorMatrix4x4& matrix, const CVelGLScope& scope)
@@ -353,7 +385,7 @@ static Box BoxOfModel(const CDorList& entities, int filter)
 {
     Box box;
     for (_DorPosition* p = entities.GetHeadPosition(); p; p = CDorList::GetNextPosition(p)) {
-        const CVelGLEntity* entity = CVelGLStructure::EntityAt(p);
+        const CVelGLEntity* entity = CVelGLStructure::ListedEntity(p);
         if (!entity || (entity->DrawMode & 1) || (entity->DrawMode & 4))
             continue;
         for (int g = 0; g < entity->groups.GetSize(); ++g) {

@@ -12,6 +12,7 @@
 #include "../model/vel_primitive.h"
 
 class CVelGLRenderState;
+class CVelGLLiveHandles;
 
 /// The OpenGL primitive mode of a group, with the values of GL_POINTS to GL_TRIANGLE_FAN.
 /// VelGLModeNone marks a group whose type was never one that OpenGL can draw.
@@ -114,11 +115,19 @@ public:
 
 /// The modeller's model: the entity list, the texture list and the offset. CVelGLKarvel's
 /// operations of the same names work through it.
+///
+/// Every handle taken is first looked up among the live ones (a hashed set, O(1)), so a handle
+/// that is not live here (removed, emptied by Destroy, another model's, never issued) is refused
+/// without being dereferenced. Node addresses are reused: a removed entity's handle becomes live
+/// again when a later entity gets its node, and then addresses that entity.
 class CVelGLStructure {
 public:
     CDorList entities;  ///< Of CVelGLEntity*, owned; the list order is the drawing order.
     CDorArray<_DorBitmap, _DorBitmap&> textures;  ///< Texture name i + 1 is element i.
     DorVector3 offset;  ///< The scene is drawn translated by -offset (times the model scale).
+    /// The handles of the entities in the list; owned. Behind a pointer so that the size of the
+    /// modeller does not depend on the host's standard library.
+    CVelGLLiveHandles* live;
 
     /// Empty, entity nodes allocated 10 at a time.
     CVelGLStructure();
@@ -132,8 +141,15 @@ public:
     /// Deletes every entity; textures stay.
     void Destroy();
 
-    /// The entity behind a handle; null for a null handle or a node without entity.
-    static CVelGLEntity* EntityAt(_DorPosition* position);
+    /// Whether position is the handle of an entity of this model (null is not).
+    bool IsLive(const _DorPosition* position) const;
+    /// The entity behind a handle; null for a handle that is not live here.
+    CVelGLEntity* EntityAt(_DorPosition* position) const;
+    /// The entity behind a handle from this model's own list walk (head to tail).
+    static CVelGLEntity* ListedEntity(_DorPosition* position)
+    {
+        return static_cast<CVelGLEntity*>(CDorList::GetAt(position));
+    }
 
     /// CVelKarvel::AddPrimitive.
     _DorPosition* AddPrimitive(const CVelPrimitive& primitive, const CVelGLScope& scope);
@@ -167,6 +183,7 @@ public:
 
 private:
     void CopyEntitiesFrom(const CVelGLStructure& other);
+    _DorPosition* Listed(_DorPosition* position);
 };
 
 /// Pixel-count limit of CVelKarvel::AddTexture: up to 512 x 512 pixels.

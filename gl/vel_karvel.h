@@ -17,9 +17,16 @@
 /// keeps it after the call; the modeller copies what it keeps. Pointers the modeller returns
 /// (GetFreeProperty, GetTextureList) point into its own storage: valid until the entity or the
 /// texture list goes, never freed by the host.
-/// - Handles: entities are addressed by the _DorPosition* returned by AddPrimitive/AddShape; a
-/// null handle, or one whose node holds no entity, makes an operation do nothing. A removed
-/// entity's handle must not be used again.
+/// - Handles: entities are addressed by the _DorPosition* returned by AddPrimitive/AddShape. A
+/// handle that is not live in this modeller (null, removed, emptied by RemoveShapeAll or Finalize,
+/// another modeller's, never issued) is refused by every operation that takes one, without being
+/// dereferenced: the operation does nothing or returns its failure value (GetDrawMode -1,
+/// GetFreeProperty null). Node addresses are reused, so a removed entity's handle can become
+/// live again as the handle of a later entity, and then addresses that entity: drop handles
+/// when their entities go.
+/// - Misuse: where the modeller can refuse a call without changing a documented result it does
+/// (the failure value, state untouched); the reference of each operation says what it refuses.
+/// SetCheckedMode reports misuse while a host is in development.
 /// - Drawing: nothing redraws by itself except DrawModel and the glides (AnimationCamera,
 /// KarvelAllmodelView, KarvelAllmodelView_vp); after a change, the host calls DrawModel.
 /// - Operations that need a live modeller (camera, lights, viewport, cull mode, drawing,
@@ -42,6 +49,10 @@
 #include "../model/vel_primitive.h"
 
 class CDorShape;
+
+/// Receives one report of checked mode (CVelKarvel::SetCheckedMode): a line starting "karvel: ",
+/// valid during the call, and the context the host gave.
+typedef void (*VelMisuseCallback)(const char* message, void* context);
 
 /// One hit of CVelKarvel::HitTest.
 struct _VelSelect {
@@ -78,7 +89,8 @@ public:
     /// and lights (as SetCurrent does).
     ///
     /// Returns 1 as implemented, even when the pixel format or the context could not be made: check
-    /// GetCurrent() != NULL to know that a context exists. Pure in the base.
+    /// GetCurrent() != NULL to know that a context exists (both forms, on the first call and on a
+    /// move; this result is kept as it is, not refused). Pure in the base.
     /* 2 */ virtual int Initialize(HDC& dc) = 0;
     /// Destroys every entity (textures are kept), drops camera, lights and viewport, and releases
     /// and deletes the context. Safe to call repeatedly and before Initialize; the destructor calls
@@ -91,20 +103,22 @@ public:
     /* 4 */ virtual HDC SetCurrent(HDC& dc);
     /// The calling thread's current DC (wglGetCurrentDC), or null without a context. Base: null.
     /* 5 */ virtual HDC GetCurrent();
-    /// Removes and deletes the entity and sets position to null. Pure in the base.
+    /// Removes and deletes the entity and sets position to null; a handle that is not live is
+    /// refused (left as it is, nothing removed). Pure in the base.
     /* 6 */ virtual void RemoveShapeAt(_DorPosition*& position) = 0;
     /// Removes and deletes every entity; textures are kept. Every handle is invalid afterwards.
     /// Pure in the base.
     /* 7 */ virtual void RemoveShapeAll() = 0;
     /// Moves the entity to the end of the drawing order (drawn last: how transparent entities go
-    /// after opaque ones) and writes its handle back; always use the handle as written back. Base:
-    /// nothing.
+    /// after opaque ones) and writes its handle back; always use the handle as written back. A
+    /// handle that is not live is refused and left as it is. Base: nothing.
     /* 8 */ virtual void MoveDepthToTail(_DorPosition*& position);
     /// Moves the entity to the start of the drawing order (drawn first); as MoveDepthToTail. Base:
     /// nothing.
     /* 9 */ virtual void MoveDepthToHead(_DorPosition*& position);
     /// The entity's list of integers for the host's own use (the library never reads it), owned by
-    /// the entity and valid until it is removed; null for a null handle. Pure in the base.
+    /// the entity and valid until it is removed; null for a handle that is not live. Pure in the
+    /// base.
     /* 10 */ virtual CDorArray<long, long>* GetFreeProperty(_DorPosition*& position) = 0;
     /// Writes into centre (x, y, z; model units) the centre of the axis-aligned box of the stored
     /// vertex positions; (0, 0, 0) for an empty box. Entities whose DrawMode has value 1 (hidden)
@@ -209,11 +223,12 @@ public:
     /// Updates the entity at position from primitive, the parts that flags select (VelChangeFlag;
     /// 31 = all): 1 geometry, 2 material and render kind, 4 group type, indices and line width, 8
     /// texture, 16 DrawMode. Groups match by index; with flag 1 and another group count the entity
-    /// is converted anew. Base: nothing.
+    /// is converted anew. A handle that is not live is refused. Base: nothing.
     /* 38 */ virtual void ChangePrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags);
     /// Rebuilds primitive from the entity (its groups are replaced; pass a fresh one): the parts
     /// flags select (as ChangePrimitive), the others at their defaults; flag 16 copies DrawMode.
-    /// Values come back from single precision. Base: nothing.
+    /// Values come back from single precision. A handle that is not live is refused, primitive
+    /// left as it was. Base: nothing.
     /* 39 */ virtual void GetPrimitive(_DorPosition* position, CVelPrimitive& primitive, long flags);
     /// Stores a copy of bitmap as a texture and returns its name (1, 2, ...: its place in the
     /// list), or 0 when refused: 1, 24 or 32 bits per pixel, width x height a power of two from 2
@@ -234,22 +249,25 @@ public:
     // Built on the virtual operations above, so they work for any modeller.
     /// Converts shape (CVelShapeToPrimitive) and adds it as one entity: AddPrimitive of the result.
     /// Only extrusions produce groups; solid extrusions may reorder their profiles' points in
-    /// place. The host keeps the shape.
+    /// place. The host keeps the shape. Refuses (null, nothing added) a shape with a NaN or
+    /// infinite point or texture vector in one of its extrusions.
     _DorPosition* AddShape(CDorShape& shape);
-    /// Converts shape and replaces the whole entity with it (ChangePrimitive, flags 31).
+    /// Converts shape and replaces the whole entity with it (ChangePrimitive, flags 31). A shape
+    /// that AddShape refuses leaves the entity as it was.
     void ChangeShape(_DorPosition* position, CDorShape& shape);
-    /// Appends the groups of shape to primitive, without touching the model.
+    /// Appends the groups of shape to primitive, without touching the model. A shape that
+    /// AddShape refuses leaves primitive as it was.
     void ShapeToPrimitive(const CDorShape& shape, CVelPrimitive& primitive);
-    /// Gives every group of the entity material.
+    /// Gives every group of the entity material; a handle that is not live is refused.
     void ChangeMaterial(_DorPosition* position, _DorMaterial& material);
     /// Transforms the entity's vertices by matrix (row vectors, translation in row 3) through
     /// GetPrimitive/ChangePrimitive: normals go through the full matrix, translation included, then
     /// are renormalised. CVelGLKarvel::MoveShape (same name, not virtual) turns normals without
-    /// translation: call it on the CVelGLKarvel to get that.
+    /// translation: call it on the CVelGLKarvel to get that. A handle that is not live is refused.
     void MoveShape(_DorPosition* position, DorMatrix4x4& matrix);
-    /// The entity's DrawMode (value 1 hidden, 2 pickable), or -1 for a null handle.
+    /// The entity's DrawMode (value 1 hidden, 2 pickable), or -1 for a handle that is not live.
     long GetDrawMode(_DorPosition*& position);
-    /// Sets the entity's DrawMode.
+    /// Sets the entity's DrawMode; a handle that is not live is refused.
     void SetDrawMode(_DorPosition*& position, long mode);
     /// The nearest pickable entity under x, y (HitTest's first hit), or null.
     _DorPosition* HitTestS(HDC dc, int x, int y);
@@ -263,9 +281,23 @@ public:
     void AnimationCamera(_VelCamera from, _VelCamera to, double duration, HDC dc);
     /// Fit-all with a glide: the camera that SetCameraForAllView_Hi(filter) computes is reached
     /// over duration milliseconds of AnimationCamera on dc, then set exactly and drawn once more.
-    /// When the fit leaves the camera as it is (an empty model) nothing is drawn.
+    /// When the fit leaves the camera as it is (an empty model) nothing is drawn. A camera that
+    /// holds inf or NaN is never glided from: the fit, if it finds one, is set and drawn once;
+    /// otherwise nothing is drawn.
     void KarvelAllmodelView(HDC dc, int filter, double duration);
     /// The same after returning to the reset viewport (applied, with the camera's aspect ratio),
     /// which undoes every ViewportZoom.
     void KarvelAllmodelView_vp(HDC dc, int filter, double duration);
+
+    /// Checked mode, for hosts in development: off by default (on from the start in a library
+    /// built with -DKARVEL_CHECKED=ON). While on, every misuse the library can see is reported as
+    /// one line through OutputDebugStringA and to callback (when not null) with context: a change
+    /// of the model, the camera or the viewport, drawing, picking or capture from a thread other
+    /// than the one that initialised the modeller; drawing, picking or capture while no context
+    /// or another one than the modeller's is current; a handle that is not live
+    /// in the modeller; a shape with a non-finite coordinate, or a non-finite camera given to
+    /// SetCamera; a texture that will not reach OpenGL (added or changed while live, so waiting
+    /// for the next Initialize, or refused by the upload). Every result is the same on and off.
+    /// Process-wide: set it before the modellers are used. on 0 turns it off.
+    static void SetCheckedMode(int on, VelMisuseCallback callback, void* context);
 };

@@ -38,11 +38,16 @@ void CVelKarvel::KarvelAllmodelView(HDC dc, int filter, double duration)
     SetCameraForAllView_Hi(filter);
     _VelCamera to = from;
     GetCamera(to);
+    // A camera holding inf or NaN differs from every other (its differences are NaN): with no
+    // fit to go to nothing is drawn, and from such a camera there is no glide, only the jump.
+    if (!VelCameraIsFinite(to))
+        return;
     DorVector3 eyeMove = to.eye - from.eye;
     DorVector3 targetMove = to.target - from.target;
     if (DorDot(eyeMove, eyeMove) == 0.0 && DorDot(targetMove, targetMove) == 0.0 && to.zFar == from.zFar)
         return;
-    AnimationCamera(from, to, duration, dc);
+    if (VelCameraIsFinite(from))
+        AnimationCamera(from, to, duration, dc);
     SetCamera(to);
     DrawModel(dc);
 }

@@ -18,5 +18,6 @@ double VelSelectDepth(unsigned int minimumDepth);
 void VelDecodeHits(const unsigned int* buffer, int bufferWords, int hitCount, _DorPosition* const* names,
                    int nameCount, CDorArray<_VelSelect, _VelSelect&>& hits);
 
-// Ascending depth by comb sort (gap shrinking by 10/13); equal depths keep their order.
+// Ascending depth by comb sort (gap shrinking by 10/13). Not stable: a pass never swaps two equal
+// depths, but the longer gaps carry hits past each other, so equal depths may come out reversed.
 void VelSortHits(_VelSelect* hits, int count);

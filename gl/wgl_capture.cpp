@@ -31,6 +31,7 @@ bool RenderableSize(int width, int height)
 
 void CVelGLKarvel::ToBitmap(_DorBitmap& bitmap, _DORRECT& rect)
 {
+    CheckDrawing("ToBitmap");
     if (!renderState)
         return;
     HDC windowDC = wglGetCurrentDC();

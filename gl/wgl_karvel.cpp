@@ -4,7 +4,10 @@
 #include <windows.h>
 #include <GL/gl.h>
 
+#include <string>
 #include <vector>
+
+#include "gl/vel_misuse.h"
 
 CVelGLKarvel::CVelGLKarvel() : renderState(nullptr), modelScale(1.0) {}
 
@@ -29,6 +32,7 @@ int CVelGLKarvel::InitializeOn(HDC dc, const _VelViewport* viewport)
         context.Release();
         context.Create(dc);
     }
+    renderState->ownerThread = VelThreadId();
     if (viewport)
         renderState->ApplyViewport(*viewport);
     StartUpContext();
@@ -60,8 +64,16 @@ HDC CVelGLKarvel::SetCurrent(HDC& dc)
 
 HDC CVelGLKarvel::GetCurrent() { return wglGetCurrentDC(); }
 
+void CVelGLKarvel::CheckDrawing(const char* operation) const
+{
+    CheckThread(operation);
+    if (renderState && VelCheckedMode() && (!context.handle || wglGetCurrentContext() != context.handle))
+        VelReportMisuse((std::string(operation) + " while the modeller's context is not current").c_str());
+}
+
 void CVelGLKarvel::SetViewport(_VelViewport& viewport)
 {
+    CheckDrawing("SetViewport");
     if (!renderState)
         return;
     renderState->ApplyViewport(viewport);
@@ -80,6 +92,8 @@ void CVelGLKarvel::UploadTextures()
     int count = model.textures.GetSize();
     std::vector<GLuint> names(static_cast<size_t>(count));
     glGenTextures(count, names.data());
+    for (int drained = 0; VelCheckedMode() && drained < 8 && glGetError() != GL_NO_ERROR; ++drained) {
+    }
     if (count > 0)
         glEnable(GL_TEXTURE_2D);
     else
@@ -88,13 +102,14 @@ void CVelGLKarvel::UploadTextures()
         const _DorBitmap& bitmap = model.textures[i];
         glBindTexture(GL_TEXTURE_2D, names[static_cast<size_t>(i)]);
         // The host may have edited the list in place since the image was accepted.
-        if (!VelTexturePixelsPresent(bitmap))
-            continue;
-        if (bitmap.info.bitCount == 24)
+        bool present = VelTexturePixelsPresent(bitmap);
+        if (present && bitmap.info.bitCount == 24)
             glTexImage2D(GL_TEXTURE_2D, 0, GL_RGB, bitmap.info.width, bitmap.info.height, 0, GL_BGR_EXT,
                          GL_UNSIGNED_BYTE, bitmap.bits.GetData());
-        else if (bitmap.info.bitCount == 32)
+        else if (present && bitmap.info.bitCount == 32)
             glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, bitmap.info.width, bitmap.info.height, 0, GL_BGRA_EXT,
                          GL_UNSIGNED_BYTE, bitmap.bits.GetData());
+        if (VelCheckedMode() && (!present || bitmap.info.bitCount == 1 || glGetError() != GL_NO_ERROR))
+            VelReportMisuse(("texture " + std::to_string(i + 1) + " gets no image (1 bit, missing pixels or refused by OpenGL)").c_str());
     }
 }

@@ -2,6 +2,8 @@
 /// @file
 /// CDorArray, the growable array that every record of the library holds its lists in.
 #include <cassert>
+#include <climits>
+#include <cstdint>
 #include <cstdlib>
 #include <cstring>
 #include <new>
@@ -15,7 +17,7 @@
 /// - growing relocates elements bitwise (never copy-constructs them), so an element must not
 ///   hold a pointer into itself, and pointers to elements are invalid after any growth;
 /// - the automatic growth step is size/8 clamped to 4..1024, and a grown array holds
-///   max(newSize, maxSize + step) elements.
+///   max(newSize, maxSize + step) elements (GrownCapacity).
 ///
 /// Indexed access is bounds-checked in debug builds only. A failed allocation throws
 /// std::bad_alloc. Not thread-safe; the library never shares one array between threads.
@@ -71,7 +73,9 @@ public:
     void SetSize(int newSize, int newGrowBy = -1) { Resize(newSize, newGrowBy, true); }
 
     /// Stores a copy of element at index (0 or more), growing the array first when index is past
-    /// the end. element may be one of this array's own elements.
+    /// the end. element may be one of this array's own elements. Index INT_MAX, which would need
+    /// more elements than an int counts, fails as an allocation does (std::bad_alloc, the array
+    /// unchanged).
     void SetAtGrow(int index, ARG_TYPE element)
     {
         assert(index >= 0);
@@ -79,6 +83,8 @@ public:
             data[index] = element;
             return;
         }
+        if (index == INT_MAX)
+            throw std::bad_alloc();
         if (Holds(&element)) {  // growing would move the source out from under us
             TYPE copy(element);
             SetAtGrow(index, copy);
@@ -102,6 +108,18 @@ public:
         int index = size;
         SetAtGrow(index, element);
         return index;
+    }
+
+    /// The capacity that growing from maxSize elements to newSize (> maxSize) gives: the larger of
+    /// newSize and maxSize + step, where step is growBy, or size / 8 clamped to 4..1024 when growBy
+    /// is 0. Capped at INT_MAX rather than overflowing.
+    static int GrownCapacity(int size, int maxSize, int growBy, int newSize)
+    {
+        long long step = growBy;
+        if (step == 0)
+            step = size / 8 < 4 ? 4 : (size / 8 > 1024 ? 1024 : size / 8);
+        long long grown = maxSize + step;
+        return grown > newSize ? static_cast<int>(grown < INT_MAX ? grown : INT_MAX) : newSize;
     }
 
 private:
@@ -133,6 +151,8 @@ private:
     {
         // NOTE: realloc is the bitwise relocation the growth rule asks for; for large blocks the C
         // runtime can move pages instead of bytes, which keeps the fixed 1024-element step cheap.
+        if (static_cast<size_t>(count) > SIZE_MAX / sizeof(TYPE))  // 32-bit targets
+            throw std::bad_alloc();
         void* p = std::realloc(static_cast<void*>(old), sizeof(TYPE) * static_cast<size_t>(count));
         if (!p)
             throw std::bad_alloc();
@@ -167,12 +187,7 @@ private:
             size = newSize;
             return;
         }
-        int step = growBy;
-        if (step == 0) {
-            step = size / 8;
-            step = step < 4 ? 4 : (step > 1024 ? 1024 : step);
-        }
-        int newMax = maxSize + step > newSize ? maxSize + step : newSize;
+        int newMax = GrownCapacity(size, maxSize, growBy, newSize);
         data = Reallocate(data, newMax);
         if (construct)
             ConstructRange(size, newSize);

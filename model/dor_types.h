@@ -163,6 +163,7 @@ inline int DorBitmapRowBytes(int width, int bitCount)
 /// The opaque entity handle: a `_DorPosition*` is the address of a CDorList node, null for "no
 /// entity". The modeller hands one out for every entity it stores; it stays valid until that
 /// entity is removed (or the model emptied), whatever happens to other entities. Operations that
-/// may move an entity take `_DorPosition*&` and write the new handle back. A stale handle is not
-/// detected.
+/// may move an entity take `_DorPosition*&` and write the new handle back. The modeller refuses a
+/// handle that is not live in it; a node address is reused for a later entity, whose handle it
+/// then is.
 struct _DorPosition;

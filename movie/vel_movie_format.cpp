@@ -43,6 +43,11 @@ bool VelMovieFormatBlock(const _DorBitmap& frame, CDorArray<unsigned char, unsig
     return true;
 }
 
+bool VelMovieMayStart(int started, const DorBitmapInfoHeader& frame)
+{
+    return !started && frame.width > 0 && frame.height != 0;
+}
+
 bool VelMovieFrameFits(const DorBitmapInfoHeader& format, const _DorBitmap& frame)
 {
     return frame.info.width == format.width && frame.info.height == format.height &&

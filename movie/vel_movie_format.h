@@ -45,6 +45,10 @@ VelAviStreamInfo VelMovieStreamInfo(const DorBitmapInfoHeader& format, int rate,
 // palette for 1, 8 and 16 bits. Returns false for any other depth than 1, 8, 16, 24 and 32.
 bool VelMovieFormatBlock(const _DorBitmap& frame, CDorArray<unsigned char, unsigned char>& block);
 
+// Whether a recorder may start on frame: never while it records (the file being written is kept
+// whole), and only on a frame with pixels (width above 0, height not 0; negative is top-down).
+bool VelMovieMayStart(int started, const DorBitmapInfoHeader& frame);
+
 // A recording takes only frames of the width, height and depth it started with.
 bool VelMovieFrameFits(const DorBitmapInfoHeader& format, const _DorBitmap& frame);
 

@@ -33,7 +33,7 @@ namespace {
 typedef CDorArray<unsigned char, unsigned char> ByteArray;
 
 // fopen first, so that a path in a missing folder fails before the AVI library is opened; the
-// file is left created and empty.
+// file is left created and empty until the recorder opens it or Abandon removes it.
 bool CreateEmptyFile(const char* path)
 {
     std::FILE* f = path ? std::fopen(path, "wb") : nullptr;
@@ -41,6 +41,13 @@ bool CreateEmptyFile(const char* path)
         return false;
     std::fclose(f);
     return true;
+}
+
+// A Start that fails after creating the file removes it: no empty movie is left behind.
+int Abandon(const char* path)
+{
+    std::remove(path);
+    return 0;
 }
 
 // The stream header and the format block for frames like bitmap, with the header copied into
@@ -167,18 +174,18 @@ CVelMathMovie::~CVelMathMovie()
 
 int CVelMathMovie::Start(_DorBitmap& bitmap, const char* path, int rate, const char* name, int length)
 {
-    if (!CreateEmptyFile(path))
+    if (!VelMovieMayStart(started, bitmap.info) || !CreateEmptyFile(path))
         return 0;
     frame = 0;
     AVISTREAMINFOA info;
     ByteArray block;
     if (!DescribeStream(bitmap, rate, name, length, info, format, block))
-        return 0;
+        return Abandon(path);
 
     AVIFileInit();
     if (!ChooseCompressor(block, compressor)) {
         AVIFileExit();
-        return 0;
+        return Abandon(path);
     }
     AVICOMPRESSOPTIONS options = CompressOptions(compressor);
     info.fccHandler = compressor.fccHandler;
@@ -188,7 +195,7 @@ int CVelMathMovie::Start(_DorBitmap& bitmap, const char* path, int rate, const c
                 SetFormat(compressedStream, block);
     if (!open) {
         End();  // releases whatever was made, the compressor and the AVI library
-        return 0;
+        return Abandon(path);
     }
     frame = 0;
     started = 1;
@@ -240,18 +247,18 @@ CVelMathMovie_NoComp::~CVelMathMovie_NoComp()
 
 int CVelMathMovie_NoComp::Start(_DorBitmap& bitmap, const char* path, int rate, const char* name, int length)
 {
-    if (!CreateEmptyFile(path))
+    if (!VelMovieMayStart(started, bitmap.info) || !CreateEmptyFile(path))
         return 0;
     frame = 0;
     AVISTREAMINFOA info;
     ByteArray block;
     if (!DescribeStream(bitmap, rate, name, length, info, format, block))
-        return 0;
+        return Abandon(path);
 
     AVIFileInit();
     if (!OpenFileAndStream(path, info, file, stream) || !SetFormat(stream, block)) {
         End();  // releases whatever was made and the AVI library
-        return 0;
+        return Abandon(path);
     }
     frame = 0;
     started = 1;

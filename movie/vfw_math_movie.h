@@ -8,8 +8,10 @@
 ///
 /// Failures are a 0 result and nothing else: a path that cannot be created, an unsupported bit
 /// count, a cancelled compressor dialog, a failing AVIFile call, a frame of another size or
-/// depth, Add before Start. A failed Start leaves the recorder idle and the AVI library closed;
-/// Start while recording is not guarded. Windows only. A recorder is used from one thread at a
+/// depth, Add before Start. Start refuses, touching nothing, while the recorder is recording (the
+/// file being written stays whole: End it first) and for a frame without pixels (width or height
+/// 0). A Start that fails later leaves the recorder idle, the AVI library closed and no file at
+/// path (one that was there is lost: Start overwrites from the moment it creates the file). Windows only. A recorder is used from one thread at a
 /// time (the compressor dialog is modal on the calling thread). An MFC host gets the CBitmap
 /// overloads by including its MFC headers first.
 #include <windows.h>
@@ -29,7 +31,8 @@ public:
     /// Creates (or truncates) the AVI file at path for frames like bitmap, after the user has
     /// chosen a compressor. rate is in frames per second, length is the stream length in frames
     /// written to the stream header; of name only the first character is used. Writes no frame:
-    /// Add the first one too. Returns 1 started, 0 failed.
+    /// Add the first one too. Returns 1 started, or 0: refused (while
+    /// recording, a frame without pixels) or failed, leaving no file at path.
     int Start(_DorBitmap& bitmap, const char* path, int rate, const char* name, int length);
     /// @copydoc Start(_DorBitmap&, const char*, int, const char*, int)
     int Start(HBITMAP bitmap, const char* path, int rate, const char* name, int length);
@@ -40,6 +43,8 @@ public:
     /// @copydoc Add(_DorBitmap&)
     int Add(HBITMAP bitmap);
     /// Closes the streams and the file, frees the compressor and the AVI library; idle again.
+    /// Call it only while recording (IsStart): it does not check, as it never has, and an idle
+    /// End releases the AVI library once more than it was opened.
     void End();
     /// 1 between a successful Start and End, else 0.
     int IsStart();
@@ -73,7 +78,7 @@ public:
     /// Creates (or truncates) the AVI file at path for frames like bitmap. rate is in frames per
     /// second, length is the stream length in frames written to the stream header; of name only
     /// the first character is used. Writes no frame: Add the first one too. Returns 1 started,
-    /// 0 failed.
+    /// or 0: refused (while recording, a frame without pixels) or failed, leaving no file at path.
     int Start(_DorBitmap& bitmap, const char* path, int rate, const char* name, int length);
     /// @copydoc Start(_DorBitmap&, const char*, int, const char*, int)
     int Start(HBITMAP bitmap, const char* path, int rate, const char* name, int length);
@@ -83,7 +88,8 @@ public:
     int Add(_DorBitmap& bitmap);
     /// @copydoc Add(_DorBitmap&)
     int Add(HBITMAP bitmap);
-    /// Closes the stream and the file and the AVI library; idle again.
+    /// Closes the stream and the file and the AVI library; idle again. Call it only while
+    /// recording, as CVelMathMovie::End.
     void End();
     /// 1 between a successful Start and End, else 0.
     int IsStart();

@@ -1,5 +1,7 @@
 #include "primitives/vel_math_primitive.h"
 
+#include <climits>
+
 namespace {
 // The line material derived from one base colour; products in double, stored as float.
 _DorMaterial LineMaterial(const DorColorValue& c)
@@ -36,7 +38,8 @@ int CVelMathPrimitive::MakeLine(DorVector3 from, DorVector3 to, CVelPrimitive& p
 
 int CVelMathPrimitive::MakeGrid(DorVector2 corner0, DorVector2 corner1, int divisions, CVelPrimitive& primitive)
 {
-    if (divisions == 0 || divisions < -1)
+    // 4 (divisions + 1) vertices must fit in an int.
+    if (divisions == 0 || divisions < -1 || divisions >= INT_MAX / 4)
         return -1;
     double x0 = corner0.x, y0 = corner0.y, x1 = corner1.x, y1 = corner1.y;
     double stepX = (x1 - x0) / static_cast<double>(divisions);

@@ -19,7 +19,8 @@ public:
     static int MakeLine(DorVector3 from, DorVector3 to, CVelPrimitive& primitive);
     /// Appends divisions + 1 lines parallel to X interleaved with divisions + 1 parallel to Y,
     /// spanning the rectangle between the corners (model units, at z = 0) whatever their order,
-    /// in a grey material. Returns the new group's index; divisions of 0 or below -1 are refused
-    /// with -1 and the primitive is left untouched (-1 itself appends a group without vertices).
+    /// in a grey material. Returns the new group's index; divisions of 0, below -1, or of
+    /// 536,870,911 and more (whose 4 (divisions + 1) vertices no int counts) are refused with -1
+    /// and the primitive is left untouched (-1 itself appends a group without vertices).
     static int MakeGrid(DorVector2 corner0, DorVector2 corner1, int divisions, CVelPrimitive& primitive);
 };

@@ -19,11 +19,12 @@ karvel_require_packages() {
   "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get -o DPkg::Lock::Timeout=600 install -y -qq "${missing[@]}" >/dev/null
 }
 
-# The Microsoft-ABI check (scripts/check-msabi.sh) needs clang-cl, libc++ and Wine's headers.
+# The Microsoft-ABI check (scripts/check-msabi.sh) needs clang-cl, libc++ and Wine's headers; the
+# fuzz targets (scripts/fuzz.sh) clang and its libFuzzer runtime.
 KARVEL_BUILD_PACKAGES=(cmake make g++ binutils mingw-w64 binutils-mingw-w64-x86-64 binutils-mingw-w64-i686
                        wine wine64 xvfb xauth libosmesa6 googletest
                        libbenchmark-dev nlohmann-json3-dev libstb-dev doxygen libglu1-mesa-dev
-                       clang-14 libc++-14-dev libwine-dev)
+                       clang-14 libc++-14-dev libwine-dev libclang-rt-14-dev)
 
 # Creates the throwaway Wine prefix of a build tree once, so that tests do not race to make it.
 karvel_wine_env() {

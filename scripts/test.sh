@@ -1,10 +1,10 @@
 #!/usr/bin/env bash
 # Builds the three presets and runs every test: the include-direction check, the portable tests
 # natively under ASan and UBSan, the DLLs' imports and exports, a host project built against the
-# installed package and through add_subdirectory, the reference check, the Windows tests under
-# 64-bit Wine on a virtual X display, the 32-bit Windows tests under 32-bit Wine where the machine
-# can run them, and the Microsoft-ABI check. Prints the time of each stage. Exits non-zero on any
-# failure.
+# installed package and through add_subdirectory, the reference check, the fuzz targets for a fixed
+# number of inputs, the Windows tests under 64-bit Wine on a virtual X display, the 32-bit Windows
+# tests under 32-bit Wine where the machine can run them, and the Microsoft-ABI check. Prints the
+# time of each stage. Exits non-zero on any failure.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/setup.sh
@@ -45,6 +45,10 @@ scripts/docs.sh --check || status=1
 
 stage "native tests"
 ctest --preset native || status=1
+
+# Every fuzz target for a fixed number of inputs from seed 1, about 30 s in all.
+stage "fuzz targets"
+scripts/fuzz.sh --runs 20000 || status=1
 
 stage "Windows tests under Wine"
 karvel_wine_env "$PWD/build/mingw64"

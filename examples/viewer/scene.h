@@ -38,7 +38,8 @@ struct Scene {
 
 // Parses scene text. fileName names the file in the message; texture files are resolved
 // against baseDir. On failure returns false, error holds "FILE: PLACE: expected WHAT" and
-// scene is unspecified.
+// scene is unspecified; text that is not JSON, or holds a number no double holds (1e400), gives
+// "FILE: line L, column C: expected valid JSON (WHY)". Nothing is thrown.
 bool ParseScene(const std::string& text, const std::string& fileName, const std::string& baseDir, Scene& scene,
                 std::string& error);
 

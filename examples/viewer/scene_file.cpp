@@ -601,13 +601,36 @@ private:
     }
 };
 
-// nlohmann's message names the line and column already; keep what follows them.
-std::string SyntaxProblem(const Json::parse_error& e)
-{
-    std::string what = e.what();
-    size_t colon = what.find(": ", what.find("column"));
-    return colon == std::string::npos ? what : what.substr(colon + 2);
-}
+// Where the text stops being JSON a double can hold (a syntax error, or a number such as 1e400
+// that overflows), and nlohmann's words for it after the line and column they name.
+class JsonProblem : public Json::json_sax_t {
+public:
+    size_t byte = 0;
+    std::string problem;
+
+    bool null() override { return true; }
+    bool boolean(bool) override { return true; }
+    bool number_integer(number_integer_t) override { return true; }
+    bool number_unsigned(number_unsigned_t) override { return true; }
+    bool number_float(number_float_t, const string_t&) override { return true; }
+    bool string(string_t&) override { return true; }
+    bool binary(binary_t&) override { return true; }
+    bool start_object(size_t) override { return true; }
+    bool key(string_t&) override { return true; }
+    bool end_object() override { return true; }
+    bool start_array(size_t) override { return true; }
+    bool end_array() override { return true; }
+    bool parse_error(size_t position, const std::string&, const Json::exception& e) override
+    {
+        byte = position;
+        problem = e.what();
+        size_t column = problem.find("column");
+        size_t start = column == std::string::npos ? problem.find("] ") : problem.find(": ", column);
+        if (start != std::string::npos)
+            problem = problem.substr(start + 2);
+        return false;
+    }
+};
 
 std::string LineAndColumn(const std::string& text, size_t byte)
 {
@@ -627,11 +650,11 @@ std::string LineAndColumn(const std::string& text, size_t byte)
 bool ParseScene(const std::string& text, const std::string& fileName, const std::string& baseDir, Scene& scene,
                 std::string& error)
 {
-    Json root;
-    try {
-        root = Json::parse(text);
-    } catch (const Json::parse_error& e) {
-        error = fileName + ": " + LineAndColumn(text, e.byte) + ": expected valid JSON (" + SyntaxProblem(e) + ")";
+    Json root = Json::parse(text, nullptr, false);
+    if (root.is_discarded()) {
+        JsonProblem located;
+        Json::sax_parse(text, &located);
+        error = fileName + ": " + LineAndColumn(text, located.byte) + ": expected valid JSON (" + located.problem + ")";
         return false;
     }
     try {

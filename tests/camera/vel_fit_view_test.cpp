@@ -83,6 +83,14 @@ TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
         CVelMathCamera::FitViewToBox(c, one * -1.0, one);
         EXPECT_TRUE(SameCameraBits(c, before)) << before.fovy;
     }
+    // Nor is any camera on a box with a corner that is not finite, or too large for doubles.
+    for (const DorVector3& corner : {DorVector3(NAN, 0, 0), DorVector3(0, HUGE_VAL, 0), one * 1e308}) {
+        const _VelCamera before = Camera(south, o, 45, 1);
+        c = before;
+        CVelMathCamera::FitViewToSphere(c, corner * -1.0, corner);
+        CVelMathCamera::FitViewToBox(c, o, corner);
+        EXPECT_TRUE(SameCameraBits(c, before)) << corner.x << " " << corner.y;
+    }
 }
 
 // A modeller whose fit moves the camera to a known place.
@@ -119,4 +127,15 @@ TEST(AllModelView, GlidesFromTheCameraToTheFitAndEndsExactlyOnIt)
     still.fitted.eye.x = HUGE_VAL;
     still.AnimationCamera(still.camera, still.fitted, 10.0, nullptr);  // the member glides its own modeller
     EXPECT_TRUE(still.drawCalls > 0 && still.setCameraCalls == 0);
+    FittingKarvel brief;  // a duration whose square underflows still gives finite frames
+    CVelMathCamera::AnimationCamera_Sec(&brief, brief.camera, brief.fitted, 1e-200, nullptr);
+    EXPECT_TRUE(brief.drawCalls > 0 && brief.setCameraCalls == brief.drawCalls);
+    // A camera holding inf: no fit, no glide, nothing drawn; with a fit, one jump to it.
+    for (bool fits : {false, true}) {
+        FittingKarvel lost;
+        lost.camera.eye.x = HUGE_VAL;
+        lost.fitted.zFar = fits ? 1000 : HUGE_VAL;
+        lost.KarvelAllmodelView(nullptr, 0, 1000);
+        EXPECT_EQ(lost.drawCalls, fits ? 1 : 0);
+    }
 }

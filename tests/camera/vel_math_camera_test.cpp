@@ -98,6 +98,7 @@ TEST(ViewportZoom, FitsTheDraggedBoxWithinFiveTimes)
         {4.0 / 3, 100, 100, 150, 130, 0, kAny, kAny, kAny, kAny},  // eight times
         {4.0 / 3, 300, 75, 100, 225, 0, 0, 0, -200, 150},          // reversed: size written, then refused
         {4.0 / 3, -kInf, -kInf, kInf, kInf, 1, 0, 0, 400, 300},    // clamped to the window
+        {-kInf, 100, 75, 300, 225, 0, kAny, kAny, kAny, kAny},     // a scale of -0 is negative too
         // w / h is 1 as an integer: the fit keeps the width, runs past the bottom and moves back up.
         {1.5, 100, 300, 290, 400, 1, static_cast<int>(-100 * 600 / 190.0), 0, static_cast<int>(600 * 600 / 190.0),
          static_cast<int>(400 * 600 / 190.0)},

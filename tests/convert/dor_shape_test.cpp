@@ -1,21 +1,4 @@
 #include "geometry_checks.h"
-#include "model/vel_primitive.h"
-
-// What a host relies on without setting it: the kinds, solid untextured geometries in the
-// groups' own default material, both caps on.
-TEST(ShapeClasses, KindsAndDefaults)
-{
-    CDorPolygon polygon;
-    CDorHolePolygon holed;
-    CDorExtruded extruded, prism(Polygon(Square(0, 0, 1)), DorVector3(0, 0, 1));
-    CDorHoleExtruded holedExtruded, holedPrism(HolePolygon(Square(0, 0, 1), {}), DorVector3(0, 0, 1));
-    EXPECT_TRUE(polygon.kind == 5 && holed.kind == 6 && extruded.kind == 7 && holedExtruded.kind == 8);
-    for (const CDorGeometry* g : std::vector<const CDorGeometry*>{&polygon, &holed, &extruded, &prism, &holedExtruded, &holedPrism})
-        EXPECT_TRUE(g->style == DorStyleSolid && g->texture == 0u && g->textureScaleU == 1.0 && g->textureScaleV == 1.0 &&
-                    g->material.shininess == CVelTrianglePolys().material.shininess && g->material.diffuse.r == 0.8f) << g->kind;
-    EXPECT_TRUE(extruded.bottomCap == 1 && extruded.topCap == 1 && prism.bottomCap == 1 && prism.topCap == 1);
-    EXPECT_TRUE(holedExtruded.bottomCap == 1 && holedExtruded.topCap == 1 && holedPrism.bottomCap == 1 && holedPrism.topCap == 1);
-}
 
 // A prism's top is its profile moved up, holes and given texture points too; a texture point not
 // given stays not given. Copies are deep.

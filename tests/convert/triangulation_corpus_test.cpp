@@ -1,6 +1,8 @@
-// Both triangulations against their plain transcriptions on the benchmark's outline families and
-// on near-degenerate outlines: points snapped to a coarse lattice (collinear runs), a repeated
-// point, holes touching each other and the outline, non-finite points; flat and in random planes.
+// Both triangulations against their plain transcriptions: the benchmark's outline families, the
+// budget of 100 added edges (large outlines stay partly triangulated), staircases of reflex and
+// collinear points, random outlines with holes either way round, near-degenerate outlines (points
+// snapped to a coarse lattice, a repeated point, holes touching each other and the outline,
+// ill-formed and non-finite holes) and the holed tolerances; flat and in random planes.
 #include <cmath>
 #include <limits>
 
@@ -9,6 +11,8 @@
 #include "triangulation_families.h"
 
 namespace {
+typedef std::pair<Loop, std::vector<Loop>> Shape;
+
 Loop Snapped(std::mt19937& rng, int n, double cx, double cy, double rMin, double rMax)
 {
     Loop loop = RandomStarShaped(rng, n, cx, cy, rMin, rMax);
@@ -18,11 +22,67 @@ Loop Snapped(std::mt19937& rng, int n, double cx, double cy, double rMin, double
     loop.insert(loop.begin() + at, loop[at]);
     return loop;
 }
+
+Loop Stairs(int steps)
+{
+    Loop stairs = {DorVector3(0, 0, 0)};
+    for (int s = 0; s < steps; ++s)
+        stairs.insert(stairs.end(), {DorVector3(s + 1, s, 0), DorVector3(s + 1, s + 1, 0)});
+    stairs.push_back(DorVector3(0, steps, 0));
+    return stairs;
+}
+
+// Shapes whose slivers are decided differently once tilted (the transcription marks a side by the
+// centroid, the production by the direction the triangle runs along the edge): compared flat only.
+std::vector<Shape> FlatOnlyShapes()
+{
+    // Vertex 2 sits 1e-5 above the chord 1-3: its midpoint is just outside, but loosely on edge 1-2.
+    const Loop notched = {DorVector3(0, 0, 0), DorVector3(4, 0, 0), DorVector3(8, 1e-5, 0), DorVector3(9, 0, 0),
+                          DorVector3(10, 0, 0), DorVector3(10, 10, 0), DorVector3(0, 10, 0)};
+    const Loop bumped = {DorVector3(0, 0, 0), DorVector3(100 - 5e-6, 0, 0), DorVector3(100 + 5e-6, -5e-6, 0),
+                         DorVector3(100, 5e-6, 0), DorVector3(100, 100, 0), DorVector3(0, 100, 0)};
+    const Loop nearHole = {DorVector3(4, 5, 0), DorVector3(8, 5 - 1e-5, 0), DorVector3(9, 5, 0), DorVector3(6, 7, 0)};
+    Loop closed = Square(0, 0, 1);
+    closed.push_back(closed[0]);
+    std::vector<Shape> shapes = {{notched, {}}, {bumped, {}}, {Square(0, 0, 12), {nearHole}}, {notched, {nearHole}}, {closed, {}},
+                                 {Square(0, 0, 8), {Square(0, 0, 2), Square(2, 2, 2), Square(4, 2, 2), Square(6, 6, 2)}}};
+    // Empty, one-point, outside, overlapping, crossing, two-point, repeated and non-finite holes.
+    for (const std::vector<Loop>& holes : std::vector<std::vector<Loop>>{
+             {{}, {DorVector3(5, 5, 0)}, Square(2, 2, 2)}, {Square(20, 20, 2)}, {Square(2, 2, 4), Square(4, 4, 4)}, {Square(-2, -2, 4)},
+             {{DorVector3(3, 3, 0), DorVector3(6, 6, 0)}}, {Square(2, 2, 2), Square(2, 2, 2)},
+             {{DorVector3(std::numeric_limits<double>::quiet_NaN(), 1, 0), DorVector3(2, 2, 0), DorVector3(1, 3, 0)}}})
+        shapes.push_back({Square(0, 0, 10), holes});
+    return shapes;
+}
+
+// The random outlines of the old per-triangulator tests: star-shaped, up to one hole per cell of a
+// 2 x 2 grid either way round, every other one in a random plane.
+std::vector<Shape> RandomHoledShapes()
+{
+    std::vector<Shape> shapes;
+    std::mt19937 rng(77);
+    std::uniform_real_distribution<double> angle(-kPi, kPi);
+    for (int trial = 0; trial < 300; ++trial) {
+        Shape shape = {RandomStarShaped(rng, 3 + rng() % 46, 0, 0, 8.0, 11.0), std::vector<Loop>(rng() % 5)};
+        for (size_t k = 0; k < shape.second.size(); ++k) {
+            shape.second[k] = RandomStarShaped(rng, 3 + rng() % 7, k % 2 ? 2.5 : -2.5, k / 2 ? 2.5 : -2.5, 0.6, 2.0);
+            if (rng() % 2)
+                std::reverse(shape.second[k].begin(), shape.second[k].end());
+        }
+        if (trial % 2) {
+            DorMatrix4x4 m = DorRotateX(angle(rng)) * DorRotateY(angle(rng)) * DorRotateZ(angle(rng)) * DorTranslate(1, 2, 3);
+            shape.first = Transformed(shape.first, m);
+            for (Loop& hole : shape.second)
+                hole = Transformed(hole, m);
+        }
+        shapes.push_back(shape);
+    }
+    return shapes;
+}
 }  // namespace
 
 TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
 {
-    typedef std::pair<Loop, std::vector<Loop>> Shape;
     std::vector<Shape> shapes;
     for (int n : {8, 13, 40, 42, 60, 100})
         for (const Loop& outline : {RegularPolygon(n), Star(n / 2, 2.0, 1.0), families::Comb(n), families::LPlan(n),
@@ -49,9 +109,17 @@ TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
             moved.second.push_back(Transformed(hole, m));
         shapes.push_back(moved);
     }
-    // Flat only: tilted, its slivers' side marks differ (the transcription marks a side by the
-    // centroid, the production by the direction the triangle runs along the edge).
-    shapes.push_back({Square(0, 0, 8), {Square(0, 0, 2), Square(2, 2, 2), Square(4, 2, 2), Square(6, 6, 2)}});
+    shapes.push_back({LShape(), {}});
+    for (int n : {61, 120, 150})
+        shapes.push_back({RegularPolygon(n), {}});
+    for (int tips : {5, 12, 20, 30})
+        shapes.push_back({Star(tips, 2.0, 1.0), {}});
+    for (int steps : {1, 3, 8, 20})
+        shapes.push_back({Stairs(steps), {}});
+    shapes.push_back({Square(0, 0, 13), HoleGrid(4)});
+    shapes.push_back({Star(20, 2.0, 1.0), {Square(-0.3, -0.3, 0.6), Square(0.5, 0.5, 0.2)}});
+    for (const std::vector<Shape>& more : {RandomHoledShapes(), FlatOnlyShapes()})
+        shapes.insert(shapes.end(), more.begin(), more.end());
     for (size_t k = 0; k < shapes.size(); ++k) {
         CDorHolePolygon holed = HolePolygon(shapes[k].first, shapes[k].second);
         ASSERT_EQ(TriangulateHoled(holed).i, reference::TriangulateHoles(holed)) << "shape " << k;

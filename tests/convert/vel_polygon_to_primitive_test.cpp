@@ -1,6 +1,5 @@
 // The plain and the holed face converters.
 #include <cmath>
-#include <limits>
 
 #include "convert/vel_polygon_to_primitive.h"
 #include "geometry_checks.h"
@@ -134,12 +133,6 @@ TEST(FaceToPrimitive, DegenerateOutlinesAndAppending)
         converter.ConvertPolygon(p, groups, 1);
     EXPECT_EQ(Layout(groups), "L4 L4 L2 L2 I4");
     EXPECT_EQ(DorLength(groups[0].vertices[0].normal), 0.0);
-    CDorPolygon bad({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(1, std::numeric_limits<double>::quiet_NaN(), 0), DorVector3(0, 1, 0)});
-    groups.SetSize(0);
-    converter.ConvertPolygon(&bad, groups, 0);
-    for (int g = 0; g < groups.GetSize(); ++g)
-        for (int k : MeshOf(groups[g]).i)
-            EXPECT_LT(k, groups[g].vertices.GetSize());
 }
 
 // Without holes a bare triangle is drawn as the triangle 0, 1, 2 itself, a nearly collinear one

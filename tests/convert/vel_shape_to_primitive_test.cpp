@@ -1,4 +1,9 @@
 #include "convert/vel_shape_to_primitive.h"
+
+#include <functional>
+#include <iterator>
+#include <limits>
+
 #include "geometry_checks.h"
 #include "tests/support/recording_karvel.h"
 
@@ -72,3 +77,37 @@ TEST_F(TwoBoxes, TheModellerStoresAndReplacesConvertedShapes)
     modeller.ShapeToPrimitive(shape, primitive);
     EXPECT_TRUE(primitive.groups.GetSize() == 2 + 10 && modeller.entities.size() == 2u);
 }
+
+// Any NaN or infinite point or texture vector that an extrusion's converter reads makes the
+// whole shape refused: AddShape returns null, ChangeShape and ShapeToPrimitive change nothing.
+// Geometries that are not converted are not read.
+TEST_F(TwoBoxes, ShapesWithANonFiniteCoordinateAreRefused)
+{
+    const double nan = std::numeric_limits<double>::quiet_NaN(), inf = std::numeric_limits<double>::infinity();
+    CDorHoleExtruded holed(HolePolygon(Square(0, 0, 4), {Square(1, 1, 1)}), DorVector3(0, 0, 1));
+    CDorPolygon bare = Polygon(Square(0, 0, 1));
+    bare.points[0].x = nan;  // a bare polygon is not converted
+    const std::function<void()> spoil[] = {
+        [&] { first.bottom.points[2].y = nan; }, [&] { second.top.points[0].z = -inf; },
+        [&] { first.top.textureOrigin.x = inf; }, [&] { second.textureAxis.z = nan; },
+        [&] { holed.top.holes[0].points[3].x = inf; }, [&] { holed.bottom.holeTextureAxis.y = nan; }};
+    CDorShape shape;
+    for (CDorGeometry* g : std::initializer_list<CDorGeometry*>{&first, nullptr, &bare, &second, &holed})
+        shape.Add(g);
+    RecordingKarvel modeller;
+    _DorPosition* entity = modeller.AddShape(shape);
+    ASSERT_TRUE(VelShapeIsFinite(shape) && entity != nullptr);
+    const CVelPrimitive stored = modeller.entities[entity];
+    for (size_t i = 0; i < std::size(spoil); ++i) {
+        CDorExtruded firstKept = first, secondKept = second;
+        CDorHoleExtruded holedKept = holed;
+        spoil[i]();
+        CVelPrimitive primitive;
+        modeller.ShapeToPrimitive(shape, primitive);
+        modeller.ChangeShape(entity, shape);
+        EXPECT_TRUE(!VelShapeIsFinite(shape) && modeller.AddShape(shape) == nullptr && primitive.groups.GetSize() == 0) << i;
+        EXPECT_TRUE(modeller.entities.size() == 1u && modeller.entities[entity].groups.GetSize() == stored.groups.GetSize()) << i;
+        first = firstKept, second = secondKept, holed = holedKept;
+    }
+}
+

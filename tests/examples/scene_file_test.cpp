@@ -1,6 +1,5 @@
 #include <gtest/gtest.h>
 
-#include "model/dor_math.h"
 #include "scene.h"
 #include "scene_model.h"
 #include "support/recording_karvel.h"
@@ -8,63 +7,20 @@
 
 namespace {
 const std::string kSource = KARVEL_SOURCE_DIR;
-
-// The faces run counter-clockwise about the extrusion and the top is the profile moved by `by`.
-template <class Polygon>  // plain or holed
-void ExpectOutwardAndMoved(const Polygon& bottom, const Polygon& top, const DorVector3& by)
-{
-    ASSERT_EQ(top.points.GetSize(), bottom.points.GetSize());
-    EXPECT_GT(DorDot(DorNewellNormal(bottom.points.GetData(), bottom.points.GetSize()), by), 0.0);
-    for (int i = 0; i < bottom.points.GetSize(); ++i)
-        EXPECT_LE(DorLength(top.points[i] - bottom.points[i] - by), 1e-12) << i;
-}
 }  // namespace
-
-// A slab given clockwise about its extrusion is turned round keeping point 0; a wall's holes run
-// the outline's way round and move to the top with it; a colour gives the ambient; the caps'
-// texture axis is a point beside each cap's first point, moving with the profile; each texture
-// file is read once and shared.
-TEST(SceneFile, ExtrusionsLightsAndCameraAreRead)
-{
-    viewer_test::ScratchDir dir("scene_file_test");
-    dir.Write("tiles.bmp", viewer_test::BmpFile(16, 16, 24));
-    Scene scene;
-    std::string error;
-    ASSERT_TRUE(ParseScene(R"({"background": [0.2, 0.3, 0.4], "camera": {"eye": [1, 2, 3], "target": [4, 5, 6], "fovy": 30, "far": 80},
-        "lights": [{"index": 3, "type": "positional", "position": [1, 1, 9], "enabled": false, "attenuation": 0.1}],
-        "entities": [
-          {"name": "slab", "type": "extrusion", "style": "wire", "caps": {"bottom": false}, "material": {"color": [1, 0, 0]},
-           "profile": [[0, 0, 0], [1, 0, 0], [1, 0, 1], [0, 0, 1]], "extrude": [0, 2, 0], "texture": {"file": "tiles.bmp", "capAxis": [1, 0, 0]}},
-          {"name": "wall", "type": "extrusion", "profile": [[0, 0, 0], [6, 0, 0], [6, 0, 3], [0, 0, 3]], "extrude": [0, 0.25, 0],
-           "holes": [[[1, 0, 0.1], [1, 0, 2.1], [2, 0, 2.1], [2, 0, 0.1]], [[3, 0, 1], [5, 0, 1], [5, 0, 2], [3, 0, 2]]],
-           "texture": {"file": "tiles.bmp"}}]})", "test.json", dir.Path(""), scene, error)) << error;
-    EXPECT_TRUE(scene.background.g == 0.3f && scene.camera.eye.y == 2.0 && scene.camera.fovy == 30.0 && scene.camera.zFar == 80.0);
-    EXPECT_TRUE(scene.lights.at(0).index == 3 && scene.lights[0].light.type == 0 && scene.lights[0].light.enabled == 0 && scene.lights[0].light.attenuation == 0.1f);
-    const CDorExtruded& slab = dynamic_cast<const CDorExtruded&>(*scene.entities[0]->geometry);
-    ExpectOutwardAndMoved(slab.bottom, slab.top, DorVector3(0, 2, 0));
-    EXPECT_TRUE(slab.bottom.points[0].x == 0 && slab.bottom.points[1].z == 1);  // (0, 0, 1) now follows point 0
-    EXPECT_TRUE(slab.bottomCap == 0 && slab.topCap == 1 && slab.style == DorStyleWire && slab.top.style == DorStyleWire);
-    EXPECT_TRUE(slab.material.diffuse.r == 1.0f && slab.material.ambient.r == 0.4f && slab.top.material.diffuse.g == 0.0f);
-    EXPECT_TRUE(DorLength(slab.bottom.textureAxis - DorVector3(1, 0, 0)) + DorLength(slab.top.textureAxis - DorVector3(1, 2, 0)) < 1e-12);
-    const CDorHoleExtruded& wall = dynamic_cast<const CDorHoleExtruded&>(*scene.entities[1]->geometry);
-    ExpectOutwardAndMoved(wall.bottom, wall.top, DorVector3(0, 0.25, 0));
-    ASSERT_TRUE(wall.bottom.holes.GetSize() == 2 && wall.top.holes.GetSize() == 2);
-    for (int h = 0; h < 2; ++h)
-        ExpectOutwardAndMoved(wall.bottom.holes[h], wall.top.holes[h], DorVector3(0, 0.25, 0));
-    EXPECT_TRUE(scene.textures.size() == 1u && scene.entities[1]->texture == 0);
-}
 
 // Each kind of mistake names the file, the place and what was expected, with what was found.
 TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
 {
     viewer_test::ScratchDir dir("scene_file_test");
-    dir.Write("odd.bmp", viewer_test::BmpFile(3, 5, 24));
+    dir.Write("odd.bmp", viewer_test::BmpFile(3, 5));
     const std::string w = R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]])";
     const std::string scene = R"({"camera": {"eye": [10, -10, 5], "target": [0, 0, 0]}, "entities": [)";
     const struct {
         std::string text, message;  // message without the leading "test.json: "
     } cases[] = {
         {"{\n  \"camera\": {\"eye\": [0, 0, 1],,\n}", "line 2, column "},  // then what JSON expected there
+        {"{\"camera\": {\"eye\": [1e400", "line 1, column 25: expected valid JSON (number overflow parsing '1e400')"},
         {scene + w + "}]}", "entities[0] (\"w\"): expected \"extrude\" (the vector from the profile to the top face) or \"top\" (the top profile)"},
         {scene + R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,"a"],[0,1,0]], "extrude": [0,0,1]}]})",
          "entities[0] (\"w\").profile[1][2]: expected a number, found the string \"a\""},

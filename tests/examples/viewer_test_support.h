@@ -1,6 +1,7 @@
 #pragma once
-// Files for the viewer's loader tests: BMP images built byte by byte and a scratch folder.
+// Files for the viewer's tests: a BMP image built byte by byte and a scratch folder.
 #include <cstdint>
+#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <string>
@@ -8,29 +9,18 @@
 
 namespace viewer_test {
 
-// Little-endian, as BMP headers store their fields.
-inline void PutU16(std::vector<unsigned char>& b, size_t at, uint32_t v) { b[at] = v & 0xFF, b[at + 1] = (v >> 8) & 0xFF; }
-inline void PutU32(std::vector<unsigned char>& b, size_t at, uint32_t v) { PutU16(b, at, v), PutU16(b, at + 2, v >> 16); }
-
-// A BMP file whose pixel (x, y), counted from the bottom row, has blue x, green y, red 200
-// (and alpha 255 at 32 bits). A negative height stores the rows top-down, as BMP allows.
-inline std::vector<unsigned char> BmpFile(int width, int height, int bitCount)
+// A 24-bit bottom-up BMP file whose pixel (x, y) has blue x, green y, red 200.
+inline std::vector<unsigned char> BmpFile(int width, int height)
 {
-    const int rows = height < 0 ? -height : height, rowBytes = ((width * bitCount + 31) / 32) * 4;
-    std::vector<unsigned char> b(54 + static_cast<size_t>(rowBytes) * rows, 0);
-    PutU16(b, 0, 'B' | 'M' << 8);
-    PutU32(b, 2, static_cast<uint32_t>(b.size()));
-    PutU32(b, 10, 54);
-    PutU32(b, 14, 40);
-    PutU32(b, 18, static_cast<uint32_t>(width));
-    PutU32(b, 22, static_cast<uint32_t>(height));
-    PutU32(b, 26, 1 | static_cast<uint32_t>(bitCount) << 16);  // planes, bits per pixel
-    for (int y = 0; y < rows; ++y)
+    const int rowBytes = (width * 3 + 3) / 4 * 4;
+    std::vector<unsigned char> b(54 + static_cast<size_t>(rowBytes) * height, 0);
+    const uint32_t header[] = {static_cast<uint32_t>(b.size()), 0, 54, 40, static_cast<uint32_t>(width), static_cast<uint32_t>(height), 1 | 24 << 16};
+    b[0] = 'B', b[1] = 'M';
+    std::memcpy(&b[2], header, sizeof header);  // little-endian, as BMP stores its fields
+    for (int y = 0; y < height; ++y)
         for (int x = 0; x < width; ++x) {
-            unsigned char* p = &b[54 + static_cast<size_t>(height < 0 ? rows - 1 - y : y) * rowBytes + static_cast<size_t>(x) * (bitCount / 8)];
+            unsigned char* p = &b[54 + static_cast<size_t>(y) * rowBytes + static_cast<size_t>(x) * 3];
             p[0] = static_cast<unsigned char>(x), p[1] = static_cast<unsigned char>(y), p[2] = 200;
-            if (bitCount == 32)
-                p[3] = 255;
         }
     return b;
 }

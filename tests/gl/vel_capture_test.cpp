@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <climits>
 #include <vector>
 
 #include "gl/vel_capture.h"
@@ -40,4 +41,11 @@ TEST(CaptureSize, ZeroOversizedAndUnaddressableAreRefused)
                 {16385, 10, 16384, false}, {10, 16385, 16384, false}, {30000, 30000, 65536, false}, {10, 10, 0, false}};
     for (const auto& r : rows)  // 30000 x 30000 would be 3.6 GB of rows; a maximum of 0: no context to ask
         EXPECT_EQ(VelCaptureSizeAllowed(r.width, r.height, r.max, r.max), r.allowed) << r.width << "x" << r.height;
+    // Whose 24-bit rows no int counts, or not positive: no bits reserved, the array as it was.
+    const int unreserved[][2] = {{INT_MAX, 1}, {26755, 26755}, {0, 1}, {1, -1}};
+    for (const auto& size : unreserved) {
+        _DorBitmap bitmap;
+        bitmap.bits.SetSize(3);
+        EXPECT_TRUE(!VelReserveCaptureBits(bitmap, size[0], size[1]) && bitmap.bits.GetSize() == 3) << size[0] << "x" << size[1];
+    }
 }

@@ -118,7 +118,7 @@ TEST_F(SquareAndStripEntity, EachFlagReadsAndChangesOnlyItsParts)
     }
     other.groups[0].RenderKind = 7;
     model.ChangePrimitive(handle, other, VelChangeMaterial, scope);
-    EXPECT_EQ(CVelGLStructure::EntityAt(handle)->groups[0].RenderKind, VelRenderLit);  // unknown kinds are stored as lit
+    EXPECT_EQ(model.EntityAt(handle)->groups[0].RenderKind, VelRenderLit);  // unknown kinds are stored as lit
 }
 
 // Only a stored count three times the new one rewrites in place: the first vertices, nothing else.
@@ -128,7 +128,7 @@ TEST_F(SquareAndStripEntity, GeometryRewritesInPlaceOnlyAtThreeTimesTheCount)
     CVelPrimitive two = Primitive({original.groups[0], Group(VelGroupLineStrip, 2, 50)});
     two.groups[1].material.diffuse.r = 0.05f;
     model.ChangePrimitive(handle, two, VelChangeGeometry, scope);
-    const CVelGLTrianglePolygons& stored = CVelGLStructure::EntityAt(handle)->groups[1];
+    const CVelGLTrianglePolygons& stored = model.EntityAt(handle)->groups[1];
     EXPECT_TRUE(stored.vertexCount == 6 && stored.material.diffuse.r != 0.05f);  // in place: the material is not taken
     EXPECT_TRUE(stored.positions[0] == 50 && stored.positions[3] == 51 && stored.positions[6] == 2 && stored.positions[15] == 5);
 }
@@ -141,8 +141,8 @@ TEST(EntityStore, MoveEntityTurnsNormalsWithoutTranslatingThem)
     p.groups[0].vertices[1].normal = DorVector3(3, 0, 0);
     _DorPosition* handle = model.AddPrimitive(p, scope);
     model.MoveEntity(handle, DorRotateZ(DorPi / 2) * DorTranslate(10, 20, 30), scope);
-    const float* moved = &CVelGLStructure::EntityAt(handle)->groups[0].positions[3];
-    const float* normal = &CVelGLStructure::EntityAt(handle)->groups[0].normals[3];
+    const float* moved = &model.EntityAt(handle)->groups[0].positions[3];
+    const float* normal = &model.EntityAt(handle)->groups[0].normals[3];
     // Point (1, 1, 2) turns to (-1, 1, 2), then moves; its normal (3, 0, 0) turns to the unit +y.
     EXPECT_LE(DorLength(DorVector3(moved[0], moved[1], moved[2]) - DorVector3(9, 21, 32)) + DorLength(DorVector3(normal[0], normal[1], normal[2]) - DorVector3(0, 1, 0)), 1e-5);
 }
@@ -181,6 +181,43 @@ TEST(EntityStore, CentreAndBoundingBoxOfTheFilteredGroups)
     model.RemoveAt(none);
     model.MoveEntity(nullptr, DorTranslate(1, 2, 3), scope);
     EXPECT_TRUE(model.GetBoundingBox(low, high, 0, 1.0) && low.x == -100 && high.x == 702 && model.entities.GetCount() == 7);
+}
+
+// A handle that is not live in the model (removed, another model's, from a model emptied since,
+// never issued) is refused by every operation without being read (ASan would see the emptied
+// model's freed node). A copy's handles are its own; a reused node address is live again.
+TEST(EntityStore, HandlesThatAreNotLiveAreRefusedUntilTheirAddressIsReused)
+{
+    CVelGLStructure model, other, emptied;
+    CVelGLScope scope;
+    const CVelPrimitive p = Primitive({Group(VelGroupTriangles, 3, 0)});
+    _DorPosition* live = model.AddPrimitive(p, scope);
+    _DorPosition* removed = model.AddPrimitive(p, scope);
+    _DorPosition* alias = removed;
+    model.RemoveAt(alias);
+    _DorPosition* destroyed = emptied.AddPrimitive(p, scope);
+    emptied.Destroy();
+    char unrelated[64] = {};
+    for (_DorPosition* stale : {removed, other.AddPrimitive(p, scope), destroyed, reinterpret_cast<_DorPosition*>(unrelated)}) {
+        _DorPosition* handle = stale;
+        CVelPrimitive read = Primitive({Group(VelGroupPoints, 5, 0)});
+        model.ChangePrimitive(handle, read, VelChangeAll, scope);
+        model.GetPrimitive(handle, read, VelChangeAll, scope);
+        model.MoveEntity(handle, DorTranslate(1, 2, 3), scope);
+        model.MoveToHead(handle);
+        model.MoveToTail(handle);
+        model.RemoveAt(handle);
+        EXPECT_TRUE(handle == stale && !model.EntityAt(stale) && read.groups[0].vertices.GetSize() == 5);
+    }
+    CVelPrimitive now;
+    model.GetPrimitive(live, now, VelChangeAll, scope);
+    EXPECT_TRUE(Differences(now, p) == 0 && model.entities.GetCount() == 1);
+    EXPECT_FALSE(CVelGLStructure(model).IsLive(live));
+    EXPECT_TRUE(model.AddPrimitive(now, scope) == removed && model.IsLive(removed));
+    model.MoveToTail(live);  // the handle written back is live
+    EXPECT_TRUE(model.IsLive(live) && model.entities.GetTailPosition() == live);
+    model.Destroy();
+    EXPECT_FALSE(model.IsLive(live) || model.IsLive(removed));
 }
 
 // Texture names count from 1 along the list; a change needs a name in it and the smaller limit.

@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <climits>
+
 #include "model/dor_array.h"
 
 namespace {
@@ -37,6 +39,11 @@ TEST(DorArray, GrowthStepShrinkAndZeroFill)
     a.SetSize(5);
     EXPECT_EQ(a.maxSize, capacity);
     EXPECT_TRUE(a[1] == 101 && a[2] == 0 && a[4] == 0);  // the old 102 must not reappear
+    // Growth near the top of an int is capped, not overflowed; an index no int can count is refused.
+    EXPECT_EQ((CDorArray<int, int>::GrownCapacity(INT_MAX - 10, INT_MAX - 10, 0, INT_MAX - 9)), INT_MAX);
+    EXPECT_EQ((CDorArray<int, int>::GrownCapacity(100, INT_MAX - 1, 5, INT_MAX)), INT_MAX);
+    EXPECT_THROW(a.SetAtGrow(INT_MAX, 1), std::bad_alloc);
+    EXPECT_TRUE(a.GetSize() == 5 && a.maxSize == capacity);
 #ifndef NDEBUG
     EXPECT_DEATH(a[5], "");
     EXPECT_DEATH(a.SetAtGrow(-1, 0), "");

@@ -43,24 +43,23 @@ TEST(DorList, HandlesStayValidFreedNodesAreReusedFirstAndTheLastRemovalFreesTheB
     EXPECT_EQ(Contents(list), std::vector<int>{3});
 }
 
-TEST(DorList, MovingToHeadOrTailWritesTheHandleBackAndCopiesKeepOrder)
+// Order under moves and removals is checked against a standard list by the fuzz target; here the
+// quirks: a copy keeps order, assignment takes the block size, and moving the only node frees
+// every block, so the handle written back is a new one.
+TEST(DorList, CopiesKeepOrderAndMovingWritesTheHandleBack)
 {
-    int v[4] = {0, 1, 2, 3};
+    int v[3] = {0, 1, 2};
     CDorList list;
-    _DorPosition* h[4];
-    for (int i = 0; i < 4; ++i)
+    _DorPosition* h[3];
+    for (int i = 0; i < 3; ++i)
         h[i] = list.AddTail(&v[i]);
     list.MoveToHead(h[2]);
-    EXPECT_EQ(Contents(list), (std::vector<int>{2, 0, 1, 3}));
-    list.MoveToTail(h[0]);
-    EXPECT_EQ(Contents(list), (std::vector<int>{2, 1, 3, 0}));
-    EXPECT_EQ(CDorList::GetAt(h[0]), &v[0]);
     CDorList copy(list);
-    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 1, 3, 0}));
-    copy = CDorList();
-    EXPECT_EQ(copy.GetCount(), 0);
+    EXPECT_EQ(Contents(copy), (std::vector<int>{2, 0, 1}));
+    copy = CDorList(3);
+    EXPECT_TRUE(copy.GetCount() == 0 && copy.blockSize == 3);
     CDorList single;
     _DorPosition* only = single.AddTail(&v[1]);
-    single.MoveToHead(only);  // frees every block on the way: the handle must be the new one
+    single.MoveToHead(only);
     EXPECT_TRUE(single.GetHeadPosition() == only && CDorList::GetAt(only) == &v[1]);
 }

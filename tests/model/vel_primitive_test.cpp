@@ -2,30 +2,8 @@
 
 #include "model/vel_primitive.h"
 
-namespace {
-bool IsColour(const DorColorValue& c, float r, float g, float b, float a) { return c.r == r && c.g == g && c.b == b && c.a == a; }
-}  // namespace
-
-// The records a host fills start as the drawing code expects: vectors know their dimension,
-// vertices are white, a group is a lit triangle strip in the yellow default material.
-TEST(RecordDefaults, VectorsVertexRectangleAndGroup)
-{
-    CDorArray<_VelVertex, _VelVertex&> vertices;
-    vertices.SetSize(2);  // zero-filled, then constructed
-    const _VelVertex& v = vertices[1];
-    EXPECT_TRUE(v.position.dimension == 3 && v.normal.dimension == 3 && v.texcoord.dimension == 2 && DorVector2().dimension == 2);
-    EXPECT_TRUE(v.position.x == 0.0 && v.position.z == 0.0 && IsColour(v.colour, 1, 1, 1, 1));
-    _DORRECT r = {100, 80, 20, 10};  // corner order does not matter
-    EXPECT_TRUE(r.Width() == 80 && r.Height() == 70);
-    const CVelTrianglePolys g;
-    const _DorMaterial& m = CVelTrianglePolys(g).material;
-    EXPECT_TRUE(g.GroupType == 4 && g.lineWidth == 1.0f && g.RenderKind == 0 && g.OverlayFlag == 0 && m.shininess == 80.0f);
-    EXPECT_TRUE(IsColour(m.diffuse, 0.8f, 0.8f, 0.0f, 1.0f) && IsColour(m.ambient, 0.4f, 0.4f, 0.0f, 1.0f));
-    EXPECT_TRUE(IsColour(m.specular, 1.0f, 1.0f, 0.0f, 1.0f) && IsColour(m.emission, 0.0f, 0.0f, 0.0f, 0.0f));
-}
-
 // Assignment is deep and keeps the destination's storage; RemoveAll resets the kind of group but
-// keeps its look; a primitive keeps its draw mode through assignment and DeleteAll.
+// keeps its look.
 TEST(TrianglePolys, AssignmentIsDeepAndClearingKeepsTheLook)
 {
     CVelTrianglePolys src, dst;
@@ -49,17 +27,6 @@ TEST(TrianglePolys, AssignmentIsDeepAndClearingKeepsTheLook)
     EXPECT_TRUE(dst.vertices.GetSize() == 0 && dst.triangles.GetSize() == 0 && dst.triangles.maxSize == 0);
     EXPECT_TRUE(dst.material.shininess == 5.0f && dst.lineWidth == 3.0f && dst.OverlayFlag == 1);
 
-    CVelPrimitive five, two;
-    EXPECT_EQ(five.DrawMode, 2);  // pickable
-    five.groups.SetSize(5);
-    five.groups[4].vertices.SetSize(9);
-    two.groups.SetSize(2);
-    two.groups[1].GroupType = VelGroupLines;
-    two.DrawMode = 3;
-    five = two;
-    EXPECT_TRUE(five.groups.GetSize() == 2 && five.groups.maxSize == 5 && five.groups[1].GroupType == 1 && five.DrawMode == 3);
-    five.DeleteAll();
-    EXPECT_TRUE(five.groups.GetSize() == 0 && five.groups.maxSize == 0 && five.DrawMode == 3);
 }
 
 TEST(DrawnElementCount, FollowsTheGroupType)

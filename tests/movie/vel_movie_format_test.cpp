@@ -59,6 +59,18 @@ TEST(MovieFrameFits, OnlyTheStartingSizeAndDepthAreTaken)
         EXPECT_FALSE(VelMovieFrameFits(format, other)) << other.info.width << "x" << other.info.height;
 }
 
+// Start is refused while recording, whatever the frame, and for a frame without pixels.
+TEST(MovieMayStart, OnlyAnIdleRecorderOnAFrameWithPixels)
+{
+    const struct {
+        int started, width, height;
+        bool may;
+    } rows[] = {{0, 320, 240, true}, {0, 320, -240, true}, {1, 320, 240, false}, {0, 0, 240, false},
+                {0, 320, 0, false},  {0, -320, 240, false}};
+    for (const auto& r : rows)
+        EXPECT_EQ(VelMovieMayStart(r.started, Frame(r.width, r.height, 24).info), r.may) << r.started << " " << r.width << "x" << r.height;
+}
+
 TEST(MovieCompressFlags, DataRateWinsOverKeyFrames)
 {
     long cases[][3] = {{300, 15, kVelCompressDataRate}, {1, 0, kVelCompressDataRate}, {0, 15, kVelCompressKeyFrames},

@@ -118,14 +118,15 @@ int Start(Recorder& movie, _DorBitmap& first, const char* path, int length, int 
 }
 
 // What both recorders do from Start to End. Start refuses a missing folder (before any dialog),
-// an unplayable depth and a missing or deleted bitmap; a frame one pixel wider or no bitmap is
-// refused without leaving a gap; a recorder starts again from frame 0, and one destroyed while
-// recording closes its file.
+// an unplayable depth, a frame without pixels and a missing or deleted bitmap, leaving no file,
+// and a second Start while recording, leaving the recording whole; a frame one pixel wider or no
+// bitmap is refused without leaving a gap; a recorder starts again from frame 0, and one
+// destroyed while recording closes its file.
 template <class Recorder>
 void ExpectLifecycle(const std::string& path)
 {
     std::vector<_DorBitmap> kept = {Pattern(20, 10, 24, 1), Pattern(20, 10, 24, 2)};
-    _DorBitmap wider = Pattern(21, 10, 24, 3), deep = Pattern(20, 10, 24, 4);
+    _DorBitmap wider = Pattern(21, 10, 24, 3), deep = Pattern(20, 10, 24, 4), empty = Pattern(0, 10, 24, 5);
     deep.info.bitCount = 15;
     HBITMAP deleted = DibSectionOf(wider);
     DeleteObject(deleted);
@@ -134,10 +135,12 @@ void ExpectLifecycle(const std::string& path)
         Recorder movie;
         EXPECT_EQ(movie.Start(kept[0], (path + ".folder\\m.avi").c_str(), 15, "m", 1) + movie.IsStart(), 0);
         EXPECT_EQ(movie.Start(deep, path.c_str(), 15, "m", 1) + movie.Start(none, path.c_str(), 15, "m", 1) +
-                      movie.Start(deleted, path.c_str(), 15, "m", 1) + movie.IsStart() + movie.Add(kept[0]),
+                      movie.Start(deleted, path.c_str(), 15, "m", 1) + movie.Start(empty, path.c_str(), 15, "m", 1) +
+                      movie.IsStart() + movie.Add(kept[0]),
                   0);
+        EXPECT_EQ(GetFileAttributesA(path.c_str()), INVALID_FILE_ATTRIBUTES);
         ASSERT_EQ(Start(movie, kept[0], path.c_str(), 2), 1);
-        EXPECT_EQ(movie.IsStart(), 1);
+        EXPECT_EQ(movie.Start(kept[1], path.c_str(), 15, "m", 1) * 2 + movie.IsStart(), 1);
         EXPECT_EQ(movie.Add(kept[0]), 1);
         EXPECT_EQ(movie.Add(wider) + movie.Add(none) + movie.Add(static_cast<HBITMAP>(nullptr)), 0);
         EXPECT_EQ(movie.Add(kept[1]), 1);
@@ -192,6 +195,6 @@ TEST_F(MovieFile, CancelledCompressorDialogLeavesTheRecorderIdleAndFullFramesThe
     CVelMathMovie movie;
     EXPECT_EQ(Start(movie, frame, path, 1, IDCANCEL), 0);
     EXPECT_EQ(movie.IsStart() + movie.Add(frame), 0);
-    EXPECT_EQ(std::ifstream(path, std::ios::ate).tellg(), 0);  // created before the dialog, left empty
+    EXPECT_EQ(GetFileAttributesA(path), INVALID_FILE_ATTRIBUTES);  // created before the dialog, removed
     ExpectLifecycle<CVelMathMovie>(name);
 }

@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <climits>
+
 #include "primitives/vel_math_primitive.h"
 
 TEST(MathPrimitive, LinesAndGridsAppendLineGroupsAndBadDivisionsAreRefused)
@@ -11,7 +13,8 @@ TEST(MathPrimitive, LinesAndGridsAppendLineGroupsAndBadDivisionsAreRefused)
     EXPECT_EQ(CVelMathPrimitive::MakeGrid(DorVector2(4, 4), DorVector2(0, 0), 1, p), 3);  // reversed corners
     EXPECT_EQ(CVelMathPrimitive::MakeGrid(DorVector2(0, 0), DorVector2(1, 1), -1, p), 4);  // an empty group
     EXPECT_EQ(CVelMathPrimitive::MakeGrid(DorVector2(0, 0), DorVector2(1, 1), 0, p), -1);
-    EXPECT_EQ(CVelMathPrimitive::MakeGrid(DorVector2(0, 0), DorVector2(1, 1), -2, p), -1);
+    for (int divisions : {-2, 536870911, INT_MAX})  // 4 (divisions + 1) vertices past an int
+        EXPECT_EQ(CVelMathPrimitive::MakeGrid(DorVector2(0, 0), DorVector2(1, 1), divisions, p), -1) << divisions;
     ASSERT_EQ(p.groups.GetSize(), 5);
     const int sizes[] = {0, 2, 12, 8, 0};
     const double xy[][3] = {{1, 2, 3}, {1, 2, 3}, {0, 0}, {10, 0}, {0, 0}, {0, 10}, {0, 5}, {10, 5}, {5, 0}, {5, 10},

@@ -166,21 +166,6 @@ TEST_F(ViewerRun, BatchSnapshotPickAndMovie)
     EXPECT_EQ(movie.nFileSizeLow / (320 * 3 * 240), 4u);
 }
 
-// Which message a mistake gives is decided and checked natively; here the program stops with
-// it, the exit code for its kind and no picture.
-TEST_F(ViewerRun, MistakesStopWithTheirMessageAndNoPicture)
-{
-    dir.Write("syntax.json", std::string("{\"camera\": }"));
-    std::string png = " --snapshot " + Quoted(dir.Path("never.png")), syntax, size;
-    EXPECT_EQ(Viewer(Quoted(dir.Path("syntax.json")) + png).Finish(syntax), 1u);
-    EXPECT_EQ(syntax.rfind(dir.Path("syntax.json") + ": line 1, column 12: expected", 0), 0u) << syntax;
-    EXPECT_EQ(std::count(syntax.begin(), syntax.end(), '\n'), 1) << syntax;
-    EXPECT_EQ(Viewer(Quoted(scene) + " --size 10x10" + png).Finish(size), 2u);
-    EXPECT_EQ(size.rfind("karvel_viewer: --size expects WxH", 0), 0u) << size;
-    EXPECT_NE(size.find("usage: karvel_viewer"), std::string::npos) << size;
-    EXPECT_EQ(GetFileAttributesA(dir.Path("never.png").c_str()), INVALID_FILE_ATTRIBUTES);
-}
-
 // A user's session: snapshots, clicks that pick and highlight, an orbit, a pan, a fit, and
 // closing.
 TEST_F(ViewerRun, WindowAnswersTheMouseAndKeys)
