@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "convert/vel_plane2d.h"
 #include "model/dor_math.h"
@@ -13,16 +14,26 @@ const int kLeftMade = 2;
 
 VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 {
+    recentlyCrossed.fill(-1);
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
-    spans.reserve(maxEdges > 0 ? maxEdges : 0);
+    for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
+        column->reserve(maxEdges > 0 ? maxEdges + kBlock : kBlock);
+    units.reserve(maxEdges > 0 ? maxEdges : 0);
+    edgeBoxes.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
+    shared.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
 {
+    loopStarts.push_back(LoopStart{static_cast<int>(plane.size()), static_cast<int>(runs.size())});
     for (int k = 0; k < count; ++k) {
         DorVector3 p = DorTransformPoint(points[k], projection);
+        if (k % kBlock == 0)
+            runs.push_back(VelRun{k, k, VelBox()});
         plane.push_back(DorVector2(p.x, p.y));
+        runs.back().end = k + 1;
+        runs.back().box.Grow(plane.back());
         finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
         extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
     }
@@ -31,7 +42,26 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
 void VelEdgeGraph::Append(int start, int end)
 {
     edges.push_back(Edge{start, end, 0, -1, -1});
-    spans.push_back(Span{plane[start], VelSub2(plane[end], plane[start])});
+    const size_t at = edges.size() - 1;
+    if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
+        for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
+            column->resize(at + kBlock, 0.0);
+        edgeBoxes.push_back(VelBox());
+        shared.push_back(Shared{start, end});
+    }
+    edgeBoxes.back().Grow(plane[start]);
+    edgeBoxes.back().Grow(plane[end]);
+    for (int* v : {&shared.back().a, &shared.back().b}) {
+        if (*v != start && *v != end)
+            *v = -1;
+    }
+    DorVector2 unit = VelSub2(plane[end], plane[start]);
+    fromX[at] = plane[start].x;
+    fromY[at] = plane[start].y;
+    alongX[at] = unit.x;
+    alongY[at] = unit.y;
+    VelNormalize2(unit);
+    units.push_back(unit);
 }
 
 void VelEdgeGraph::AddSegment(int i, int j)
@@ -64,20 +94,66 @@ void VelEdgeGraph::AddLoopEdges(int first, int count)
     loopEdgeCount = static_cast<int>(edges.size());
 }
 
-// The appended edges are tried before the loops' own: they are the ones that usually cross.
+// Whether segment from-from+along crosses edge at, which has neither i nor j as an end.
+inline bool VelEdgeGraph::CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const
+{
+    const Edge& e = edges[at];
+    return VelSegmentsCrossAlong(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at])) &&
+           e.start != i && e.start != j && e.end != i && e.end != j;
+}
+
+bool VelEdgeGraph::CrossesRecentlyCrossed(int i, int j) const
+{
+    const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
+    for (int at : recentlyCrossed) {
+        if (at >= 0 && CrossesEdge(from, along, i, j, at))
+            return true;
+    }
+    return false;
+}
+
+// Whether the answer is yes does not depend on the order the edges are tried in. The edge that
+// crossed the last crossing candidate is tried first. Then the edges go by blocks, each
+// screened at once (side by side, without branches) by the test's own first stage; only a block
+// with an edge that may cross is gone through one edge at a time.
 bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
 {
     const DorVector2 from = plane[i], along = VelSub2(plane[j], from);
     if (along.x == 0.0 && along.y == 0.0)
         return false;  // every determinant would be 0 (or NaN)
     const int count = static_cast<int>(edges.size());
-    for (int k = loopEdgeCount; k < count + loopEdgeCount; ++k) {
-        const int at = k < count ? k : k - count;
-        const Edge& e = edges[at];
-        if (e.start == i || e.start == j || e.end == i || e.end == j)
+    // A block whose points all lie on one side of the segment's line, farther from it than the
+    // rounding of the test (below 30 ulps of |along.x| + |along.y| times the extent), holds no
+    // crossing edge: for each of its edges t's numerator keeps that side's sign and t's
+    // denominator minus its numerator the other, so t is outside (0, 1).
+    const double reach = std::fabs(along.x) + std::fabs(along.y);
+    const bool boxes = finite && extent < 1e150 && reach * extent > 1e-200;
+    const double margin = 1e-14 * reach * extent;
+    auto oneSide = [&](const VelBox& box) {
+        double least, most;  // of cross(along, p - from)
+        box.Extremes(from, DorVector2(-along.y, along.x), least, most);
+        return least > margin || most < -margin;
+    };
+    for (int block = 0; block < count; block += kBlock) {
+        const Shared& ends = shared[block / kBlock];
+        if (ends.a == i || ends.a == j || ends.b == i || ends.b == j)
+            continue;  // every edge of the block has i or j as an end
+        if (boxes && oneSide(edgeBoxes[block / kBlock]))
             continue;
-        if (VelSegmentsCrossAlong(from, along, spans[at].from, spans[at].along))
-            return true;
+        bool may = false;
+        for (int at = block; at < block + kBlock; ++at) {
+            VelCrossingTerms terms(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at]));
+            may |= terms.MayCrossInside();
+        }
+        if (!may)
+            continue;
+        for (int at = block; at < std::min(block + kBlock, count); ++at) {
+            if (CrossesEdge(from, along, i, j, at)) {
+                std::rotate(recentlyCrossed.begin(), recentlyCrossed.end() - 1, recentlyCrossed.end());
+                recentlyCrossed[0] = at;
+                return true;
+            }
+        }
     }
     return false;
 }
@@ -91,24 +167,69 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
     const double lengthSquared = VelDot2(d, d);
     if (lengthSquared == 0.0)
         return false;  // a zero-length segment holds no point
-    const bool screen = finite && extent < 1e150 && lengthSquared > 1e-200;
-    const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
-    for (int k = 0; k < static_cast<int>(plane.size()); ++k) {
-        if (k == i || k == j)
-            continue;
-        if (screen) {
-            DorVector2 w = VelSub2(plane[k], a);
-            double along = VelDot2(w, d);
-            if (!(along > 0.0 && along < lengthSquared))  // t = along / lengthSquared outside (0, 1)
-                continue;
-            double across = VelCross2(w, d);
-            if (across * across > reachSquared * lengthSquared)
-                continue;
+    const int count = static_cast<int>(plane.size());
+    auto onSegment = [&](int k) { return k != i && k != j && VelPointOnSegment(plane[k], a, plane[j]); };
+    if (!(finite && extent < 1e150 && lengthSquared > 1e-200)) {
+        for (int k = 0; k < count; ++k) {
+            if (onSegment(k))
+                return true;
         }
-        if (VelPointOnSegment(plane[k], a, plane[j]))
+        return false;
+    }
+    const double reach = 1.000001e-6 + 1e-14 * extent, reachSquared = reach * reach * 1.000001;
+    // A block of points all beyond an end of the slab, or farther than reach from the line, by
+    // more than the rounding of the screen below and of the extremes, holds no point near.
+    const double margin = 1e-14 * (std::fabs(d.x) + std::fabs(d.y)) * extent;
+    const double farAcross = reach * 1.000001 * std::sqrt(lengthSquared) + margin;
+    auto away = [&](const VelBox& box) {
+        double least, most;
+        box.Extremes(a, d, least, most);  // of along
+        if (most < -margin || least > lengthSquared + margin)
             return true;
+        box.Extremes(a, DorVector2(-d.y, d.x), least, most);  // of -across
+        return least > farAcross || most < -farAcross;
+    };
+    // Across the slab (t = along / lengthSquared in (0, 1)) and near the line; i and j never are.
+    auto near = [&](int k) {
+        DorVector2 w = VelSub2(plane[k], a);
+        double along = VelDot2(w, d), across = VelCross2(w, d);
+        return (along > 0.0) & (along < lengthSquared) & !(across * across > reachSquared * lengthSquared);
+    };
+    // By runs screened without branches, as in the crossing search.
+    for (size_t l = 0; l < loopStarts.size(); ++l) {
+        const int lastRun = l + 1 < loopStarts.size() ? loopStarts[l + 1].run : static_cast<int>(runs.size());
+        for (int r = loopStarts[l].run; r < lastRun; ++r) {
+            if (away(runs[r].box))
+                continue;
+            const int first = loopStarts[l].point + runs[r].first, end = loopStarts[l].point + runs[r].end;
+            bool any = end - first < kBlock;
+            if (!any) {
+                for (int k = first; k < first + kBlock; ++k)
+                    any |= near(k);
+            }
+            if (!any)
+                continue;
+            for (int k = first; k < end; ++k) {
+                if (near(k) && onSegment(k))
+                    return true;
+            }
+        }
     }
     return false;
+}
+
+bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
+{
+    auto loop = std::lower_bound(loopStarts.begin(), loopStarts.end(), first,
+                                 [](const LoopStart& start, int point) { return start.point < point; });
+    if (loop != loopStarts.end() && loop->point == first) {
+        const bool last = loop + 1 == loopStarts.end();
+        const int end = last ? static_cast<int>(plane.size()) : loop[1].point;
+        const int lastRun = last ? static_cast<int>(runs.size()) : loop[1].run;
+        if (end == first + count)
+            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loop->run, lastRun - loop->run);
+    }
+    return VelInsideLoop(q, plane.data() + first, count, nullptr, 0);
 }
 
 template <typename F>
@@ -138,8 +259,8 @@ int VelEdgeGraph::BestNeighbour(int c, int s, const DorVector2& u, bool clockwis
         if (k == c)
             return;
         int x = e.start == s ? e.end : e.start;
-        DorVector2 v = VelSub2(plane[x], plane[s]);
-        VelNormalize2(v);
+        // From the end, the negated unit: the same numbers as normalising P_start - P_end.
+        DorVector2 v = e.start == s ? units[k] : DorVector2(-units[k].x, -units[k].y);
         double cross = VelCross2(u, v);
         if (clockwise ? !(cross < 0.0) : !(cross > 0.0))
             return;
@@ -196,8 +317,7 @@ void VelEdgeGraph::CloseTrianglesOnAddedEdges(bool finishOnOpenRight)
         if (edges[c].sides == (kRightMade | kLeftMade))
             continue;
         int s = edges[c].start, e = edges[c].end;
-        DorVector2 u = VelSub2(plane[e], plane[s]);
-        VelNormalize2(u);
+        const DorVector2 u = units[c];
         if (!(edges[c].sides & kRightMade)) {
             int x = BestNeighbour(c, s, u, true);
             if (x >= 0) {

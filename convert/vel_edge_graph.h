@@ -5,8 +5,10 @@
 //
 // Side marks: bit 1, the triangle to the right of start->end has been made; bit 2, the one to
 // its left. Every closed triangle is counter-clockwise in the plane.
+#include <array>
 #include <vector>
 
+#include "convert/vel_plane2d.h"
 #include "model/dor_types.h"
 
 class VelEdgeGraph {
@@ -24,8 +26,13 @@ public:
 
     // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
     bool CrossesListedEdge(int i, int j) const;
+    // The same for the few edges that crossed the last crossing segments: the next pairs in the
+    // search usually cross them too, so they are worth a look before dearer tests.
+    bool CrossesRecentlyCrossed(int i, int j) const;
     // Whether some point other than i and j lies on segment i-j.
     bool PassesThroughPoint(int i, int j) const;
+    // VelInsideLoop for the points first..first+count-1 as added by one AddProjectedPoints.
+    bool InsideLoop(const DorVector2& q, int first, int count) const;
 
     // Closes the triangles on each side of every appended edge, first to last. With
     // finishOnOpenRight, an edge whose right triangle has a neighbour but lacks a closing edge
@@ -43,12 +50,11 @@ private:
         int start, end, sides;
         int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
-    // An edge's start and its end minus its start, as the crossing test forms them.
-    struct Span {
-        DorVector2 from, along;
-    };
+    static constexpr int kBlock = 8;  // edges or points screened together
+    static constexpr int kRecent = 8;
 
     void Append(int start, int end);
+    bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
     // Calls f(k) for every edge k with v as an end, in list order, each once.
     template <typename F>
     void ForEdgesAt(int v, F f) const;
@@ -61,11 +67,27 @@ private:
     int maxEdges;
     int loopEdgeCount = 0;
     std::vector<Edge> edges;
-    std::vector<Span> spans;  // per edge
+    // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
+    // test forms them.
+    std::vector<double> fromX, fromY, alongX, alongY;
+    std::vector<VelBox> edgeBoxes;  // per block of edges: the bounds of their ends
+    struct Shared {
+        int a, b;  // points that are an end of every edge of the block, -1 for none
+    };
+    std::vector<Shared> shared;  // per block of edges
+    // Each loop's points, as added, cut into runs of a block; their first point and first run.
+    std::vector<VelRun> runs;
+    struct LoopStart {
+        int point, run;
+    };
+    std::vector<LoopStart> loopStarts;
+    std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
     std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none
     // The largest coordinate magnitude, and whether every coordinate is finite.
     double extent = 0.0;
     bool finite = true;
+    // A search hint only: the edges that crossed last, latest first, -1 for none.
+    mutable std::array<int, kRecent> recentlyCrossed;
     std::vector<int> candidates;  // three per triangle
 };

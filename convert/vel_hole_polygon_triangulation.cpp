@@ -67,25 +67,25 @@ bool HoledTriangulation::MidpointInMaterial(const DorVector2& mid) const
 {
     const DorVector2* plane = graph.plane.data();
     const Loop& outline = loops[0];
-    if (!VelInsideLoop(mid, plane + outline.first, outline.count) &&
+    if (!graph.InsideLoop(mid, outline.first, outline.count) &&
         !VelOnLoopEdge(mid, plane + outline.first, outline.count))
         return false;
     for (size_t h = 1; h < loops.size(); ++h) {
         const DorVector2* hole = plane + loops[h].first;
-        if (VelInsideLoop(mid, hole, loops[h].count) && !VelOnLoopEdge(mid, hole, loops[h].count))
+        if (graph.InsideLoop(mid, loops[h].first, loops[h].count) && !VelOnLoopEdge(mid, hole, loops[h].count))
             return false;
     }
     return true;
 }
 
-// The cheap tests first; all must hold, so the order does not change the result.
+// All tests must hold, so the order does not change the result: the cheap ones first, the
+// midpoint, tested against every loop, last.
 bool HoledTriangulation::Admissible(int i, int j) const
 {
-    if (ClosesLoop(i, j) || graph.CrossesListedEdge(i, j))
+    if (ClosesLoop(i, j) || graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughPoint(i, j) ||
+        graph.CrossesListedEdge(i, j))
         return false;
-    if (!MidpointInMaterial(VelMidpoint2(graph.plane[i], graph.plane[j])))
-        return false;
-    return !graph.PassesThroughPoint(i, j);
+    return MidpointInMaterial(VelMidpoint2(graph.plane[i], graph.plane[j]));
 }
 
 // Unordered pairs, a vertex's successor in its own loop skipped: each diagonal enters once and

@@ -91,44 +91,102 @@ int RayCrossing(const DorVector2& u, const DorVector2& v, double margin)
     return 0;
 }
 
-Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count)
+// The vectors from q to the loop's points, seen a quarter turn round when turned: the ray of the
+// count then runs along +y. Exact, and every cross product, dot product and size is the same.
+DorVector2 Seen(const DorVector2& p, const DorVector2& q, bool turned)
+{
+    DorVector2 u = VelSub2(p, q);
+    return turned ? DorVector2(u.y, -u.x) : u;
+}
+
+// Whether u -> v is an edge with q on it: its term is near +-pi, where the computed atan2 may
+// take either sign, and both vectors keep more than 45 degrees from the ray's line, on either
+// side of it.
+bool AcrossQ(const DorVector2& u, const DorVector2& v)
+{
+    Term term(u, v);
+    return term.InRange() && term.dot < 0.0 && std::fabs(u.y) > std::fabs(u.x) && std::fabs(v.y) > std::fabs(v.x) &&
+           (u.y > 0.0) != (v.y > 0.0);
+}
+
+// Whether every point of the box is finite and lies strictly above, below or behind the ray, as
+// seen, and within magnitudes where no term's products overflow or underflow. Then no edge
+// between two of them crosses the ray, and its two vectors lie in one open half-plane, where
+// the cross product's sign is exact or the angle is below pi / 2: its term is within a few ulps
+// of the exact angle, whatever its size.
+bool Settled(const VelBox& box, const DorVector2& q, bool turned)
+{
+    const double kFar = 1e100, kNear = 1e-100;
+    if (!box.finite || !(std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
+          std::fabs(q.x) < kFar && std::fabs(q.y) < kFar))
+        return false;
+    if (turned)  // seen x is y, seen y is -x
+        return q.x - box.maxX > kNear || box.minX - q.x > kNear || q.y - box.maxY > kNear;
+    return box.minY - q.y > kNear || q.y - box.maxY > kNear || q.x - box.maxX > kNear;
+}
+
+// One edge m with q on it may be left out of the count: the rest of the loop runs from v_m round
+// to u_m, so its exact angles add up to phi(u_m) - phi(v_m) + 2 pi C, C its signed crossings of
+// the ray and phi measured from the ray in [0, 2 pi). With u_m and v_m nearly opposite and on
+// either side of the ray's line, that difference is within 1e-11 of -pi when u_m is above the
+// line, +pi otherwise; the term of m itself is computed as the angle sum computes it, within
+// 1e-11 of +-pi. The sum is then within 1e-10 plus its rounding of 2 pi times an integer.
+Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, bool turned, const VelRun* runs, int runCount)
 {
     if (count < 3 || count > 1000000)
         return kUnsure;
     const double sumError = count * 1e-14 + static_cast<double>(count) * count * 2e-16;
-    int winding = 0, onVertex = -1;
-    DorVector2 u = VelSub2(loop[0], q);
-    for (int k = 0; k < count; ++k) {
-        int next = k + 1 < count ? k + 1 : 0;
-        DorVector2 v = VelSub2(loop[next], q);
-        if (IsZero(u) || IsZero(v)) {
-            int at = IsZero(u) ? k : next;
-            if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
-                return kUnsure;
-            onVertex = at;
-        } else {
-            int crossing = RayCrossing(u, v, kClear);
-            if (crossing == kUnsure)
-                return kUnsure;
-            winding += crossing;
+    int winding = 0, onVertex = -1, onEdge = -1;
+    for (int r = 0; r < (runs ? runCount : 1); ++r) {
+        const int end = runs ? runs[r].end : count;
+        // A settled run's inner edges add nothing: only the one to the next run is left.
+        int k = !runs ? 0 : Settled(runs[r].box, q, turned) ? end - 1 : runs[r].first;
+        DorVector2 u = Seen(loop[k], q, turned);
+        for (; k < end; ++k) {
+            int next = k + 1 < count ? k + 1 : 0;
+            DorVector2 v = Seen(loop[next], q, turned);
+            if (IsZero(u) || IsZero(v)) {
+                int at = IsZero(u) ? k : next;
+                if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
+                    return kUnsure;
+                onVertex = at;
+            } else {
+                int crossing = RayCrossing(u, v, kClear);
+                if (crossing == kUnsure) {
+                    if (onEdge >= 0 || !AcrossQ(u, v))
+                        return kUnsure;
+                    onEdge = k;
+                    // Half a turn each way, as the term and the rest of the loop go round.
+                    bool termPositive = EdgeAngle(q, loop[k], loop[next]) > 0.0;
+                    winding += (termPositive ? 1 : -1) + (u.y > 0.0 ? -1 : 1);
+                    crossing = 0;
+                }
+                winding += crossing * 2;
+            }
+            u = v;
         }
-        u = v;
     }
     if (onVertex >= 0) {
-        DorVector2 before = VelSub2(loop[onVertex > 0 ? onVertex - 1 : count - 1], q);
-        DorVector2 after = VelSub2(loop[onVertex + 1 < count ? onVertex + 1 : 0], q);
+        if (onEdge >= 0)
+            return kUnsure;
+        DorVector2 before = Seen(loop[onVertex > 0 ? onVertex - 1 : count - 1], q, turned);
+        DorVector2 after = Seen(loop[onVertex + 1 < count ? onVertex + 1 : 0], q, turned);
         int crossing = RayCrossing(before, after, kClear + 8 * sumError);
         if (crossing == kUnsure)
             return kUnsure;
-        winding += crossing;
+        winding += crossing * 2;
     }
     return winding != 0 ? kInside : kOutside;
 }
 }  // namespace
 
-bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count)
+// Where one ray leaves the count unsure (an edge or a vertex along it), the ray a quarter turn
+// round usually does not.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount)
 {
-    Verdict verdict = WindingVerdict(q, loop, count);
+    Verdict verdict = WindingVerdict(q, loop, count, false, runs, runCount);
+    if (verdict == kUnsure)
+        verdict = WindingVerdict(q, loop, count, true, runs, runCount);
     if (verdict != kUnsure)
         return verdict == kInside;
     return VelWindingInside(VelWindingAngle(q, loop, count));

@@ -1,7 +1,9 @@
 #pragma once
 // Plane geometry shared by both triangulations. They work on outlines already projected into
 // their own plane (x, y of the plane projection), where counter-clockwise is positive.
+#include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "model/dor_types.h"
 
@@ -20,19 +22,37 @@ void VelNormalize2(DorVector2& v);
 // (cross product exactly 0) never cross.
 bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1);
 
+// The determinant and the numerators of s and t in p0 + s d = a0 + t e.
+struct VelCrossingTerms {
+    double det, sNum, tNum;
+    VelCrossingTerms(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
+    {
+        det = VelCross2(e, d);
+        DorVector2 w = VelSub2(a0, p0);
+        sNum = VelCross2(e, w);
+        tNum = VelCross2(d, w);
+    }
+    // A quotient lies in (0, 1) only when its numerator is smaller than det: without this, the
+    // segments do not cross. Also false for det = 0 and for NaN, as the quotients would be.
+    bool MayCross() const { return std::fabs(sNum) < std::fabs(det) && std::fabs(tNum) < std::fabs(det); }
+    // MayCross() and both numerators of det's sign, without a branch, so that a loop of such
+    // tests runs side by side. Without it, a quotient is not in (0, 1).
+    bool MayCrossInside() const
+    {
+        bool up = det > 0.0, down = det < 0.0;
+        return (std::fabs(sNum) < std::fabs(det)) & (std::fabs(tNum) < std::fabs(det)) &
+               (((sNum > 0.0) & (tNum > 0.0) & up) | ((sNum < 0.0) & (tNum < 0.0) & down));
+    }
+};
+
 // The same for p0 + d and a0 + e with d = p1 - p0, e = a1 - a0 already formed.
 // Inline: the triangulations call it for every candidate against every listed edge.
 inline bool VelSegmentsCrossAlong(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
 {
-    double det = VelCross2(e, d);
-    // p0 + s d = a0 + t e
-    DorVector2 w = VelSub2(a0, p0);
-    double sNum = VelCross2(e, w), tNum = VelCross2(d, w);
-    // A quotient lies in (0, 1) only when its numerator is smaller than det: most edges are
-    // settled without dividing. Also false for det = 0 and for NaN, as the quotients would be.
-    if (!(std::fabs(sNum) < std::fabs(det) && std::fabs(tNum) < std::fabs(det)))
-        return false;
-    double s = sNum / det, t = tNum / det;
+    VelCrossingTerms terms(p0, d, a0, e);
+    if (!terms.MayCross())
+        return false;  // most edges are settled without dividing
+    double s = terms.sNum / terms.det, t = terms.tNum / terms.det;
     return s > 0.0 && s < 1.0 && t > 0.0 && t < 1.0;
 }
 
@@ -44,12 +64,44 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count);
 // The same sum over the loop loop[indices[0..count-1]], for loops that live in a shared list.
 double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int* indices, int count);
 
+// Bounds of a few points; empty at first. The bounds leave out NaN: finite tells.
+struct VelBox {
+    double minX = std::numeric_limits<double>::infinity(), minY = minX, maxX = -minX, maxY = -minX;
+    bool finite = true;  // whether every point is
+    void Grow(const DorVector2& p)
+    {
+        finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
+        minX = std::min(minX, p.x);
+        minY = std::min(minY, p.y);
+        maxX = std::max(maxX, p.x);
+        maxY = std::max(maxY, p.y);
+    }
+    // The least and the most of c.x (x - a.x) + c.y (y - a.y) over the box, each rounded in
+    // five operations: within 6 ulps of 2 (|c.x| + |c.y|) m, m the largest coordinate magnitude
+    // of the box and a. Inline: the searches call it for every block.
+    void Extremes(const DorVector2& a, const DorVector2& c, double& least, double& most) const
+    {
+        bool xUp = c.x >= 0.0, yUp = c.y >= 0.0;
+        least = c.x * ((xUp ? minX : maxX) - a.x) + c.y * ((yUp ? minY : maxY) - a.y);
+        most = c.x * ((xUp ? maxX : minX) - a.x) + c.y * ((yUp ? maxY : minY) - a.y);
+    }
+};
+
+// A run of consecutive points of a loop, first..end-1 counted from the loop's first point,
+// and their bounds.
+struct VelRun {
+    int first, end;
+    VelBox box;
+};
+
 // Whether a winding sum puts its point inside: |sum| > pi.
 bool VelWindingInside(double angleSum);
 
 // VelWindingInside(VelWindingAngle(q, loop, count)), without the angles wherever the winding
-// number alone provably gives the same answer.
-bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count);
+// number alone provably gives the same answer. The loop is cut into runs, in order and covering
+// it (or runs is null): the edges within a run whose bounds keep clear of the count's ray and its
+// line are settled together.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount);
 
 // Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
 // vectors from q to the edge's ends is below 0.0001 in magnitude and, once both are normalised,

@@ -7,13 +7,14 @@
 namespace {
 const int kAddedEdgeBudget = 100;
 
-// The cheap tests first; all three must hold, so the order does not change the result.
+// All three tests must hold, so the order does not change the result: the cheap ones first,
+// the midpoint's, which always goes round the whole outline, last.
 bool Admissible(const VelEdgeGraph& graph, int i, int j)
 {
-    if (graph.CrossesListedEdge(i, j) || graph.PassesThroughPoint(i, j))
+    if (graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughPoint(i, j) || graph.CrossesListedEdge(i, j))
         return false;
     DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-    return VelInsideLoop(mid, graph.plane.data(), static_cast<int>(graph.plane.size()));
+    return graph.InsideLoop(mid, 0, static_cast<int>(graph.plane.size()));
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter

@@ -52,6 +52,10 @@ std::vector<Shape> FlatOnlyShapes()
              {{DorVector3(3, 3, 0), DorVector3(6, 6, 0)}}, {Square(2, 2, 2), Square(2, 2, 2)},
              {{DorVector3(std::numeric_limits<double>::quiet_NaN(), 1, 0), DorVector3(2, 2, 0), DorVector3(1, 3, 0)}}})
         shapes.push_back({Square(0, 0, 10), holes});
+    // A NaN point amid a long hole: the winding count must not pass over it with its neighbours.
+    Loop ring = Transformed(RegularPolygon(24, 3.0), DorTranslate(5, 5, 0));
+    ring[12].y = std::numeric_limits<double>::quiet_NaN();
+    shapes.push_back({Square(0, 0, 10), {ring}});
     return shapes;
 }
 
