@@ -29,15 +29,6 @@ CDorHolePolygon Holed(FuzzReader& r, int count)
     p.holeTextureOrigin = r.Point();
     return p;
 }
-
-template <class Extruded>
-CDorGeometry* Capped(FuzzReader& r, Extruded& e)
-{
-    e.bottomCap = r.Int(0, 1);
-    e.topCap = r.Int(0, 1);
-    e.textureAxis = r.Point();
-    return &e;
-}
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
@@ -52,18 +43,21 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
     for (int k = r.Int(0, 2); k >= 0; --k) {
         const int count = r.Int(0, 9);
         CDorGeometry* g = nullptr;
+        extruded[k].bottomCap = holeExtruded[k].bottomCap = r.Int(0, 1);
+        extruded[k].topCap = holeExtruded[k].topCap = r.Int(0, 1);
+        extruded[k].textureAxis = holeExtruded[k].textureAxis = r.Point();
         switch (r.Int(0, 4)) {
         case 0:
             extruded[k].bottom = Loop(r, count);
             extruded[k].top = r.Int(0, 1) ? extruded[k].bottom.Translated(r.Point()) : Loop(r, count + r.Int(-1, 1));
-            g = Capped(r, extruded[k]);
+            g = &extruded[k];
             break;
         case 1:
             holeExtruded[k].bottom = Holed(r, count);
             holeExtruded[k].top = holeExtruded[k].bottom.Translated(r.Point());
-            if (r.Int(0, 3) == 0 && holeExtruded[k].top.holes.GetSize() > 0)  // a hole the bottom lacks
+            if (r.Int(0, 3) == 0 && holeExtruded[k].top.holes.GetSize() > 0)  // a top hole unlike its bottom one
                 holeExtruded[k].top.holes[0].AddPoint(r.Point());
-            g = Capped(r, holeExtruded[k]);
+            g = &holeExtruded[k];
             break;
         case 2: g = &(polygons[k] = Loop(r, count)); break;
         case 3: g = &(holed[k] = Holed(r, count)); break;
