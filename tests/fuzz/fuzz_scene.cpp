@@ -7,12 +7,10 @@
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size)
 {
-    const std::string text(reinterpret_cast<const char*>(data), size);
     Scene scene;
     std::string error;
-    if (!ParseScene(text, "fuzz.json", "/nonexistent/", scene, error)) {
-        FUZZ_CHECK(error.rfind("fuzz.json: ", 0) == 0 && error.find(": expected ") != std::string::npos);
-        FUZZ_CHECK(error.find('\n') == std::string::npos);
-    }
+    if (!ParseScene(std::string(reinterpret_cast<const char*>(data), size), "fuzz.json", "/nonexistent/", scene, error))
+        FUZZ_CHECK(error.rfind("fuzz.json: ", 0) == 0 && error.find(": expected ") != std::string::npos &&
+                   error.find('\n') == std::string::npos);
     return 0;
 }
