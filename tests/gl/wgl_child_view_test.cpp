@@ -6,6 +6,7 @@
 #include <commctrl.h>
 #include <GL/gl.h>
 
+#include "model/dor_math.h"
 #include "support/gl_live_modeller.h"
 
 namespace {
