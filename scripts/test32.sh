@@ -58,7 +58,7 @@ apt_mirror() {
       awk '$1 == "deb" { i = 2; if ($i ~ /^\[/) { while ($i !~ /\]$/) i++; i++ }
                          if ($(i + 1) == "bookworm") print $i }'
     echo http://deb.debian.org/debian
-  } | head -n 1
+  } | sed -n 1p  # NOTE: not head: under pipefail its early exit fails the writers with SIGPIPE
 }
 
 mounted=()
