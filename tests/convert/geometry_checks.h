@@ -3,7 +3,6 @@
 // range, triangles counter-clockwise about the face's normal, in the material, none twice.
 #include <gtest/gtest.h>
 
-#include <random>
 #include <set>
 #include <string>
 #include <vector>
@@ -48,29 +47,10 @@ inline Loop Transformed(const Loop& points, const DorMatrix4x4& m)
 
 inline DorMatrix4x4 Tilt() { return DorRotateX(0.7) * DorRotateY(-1.1) * DorRotateZ(2.3) * DorTranslate(5, -3, 8); }
 
-// Points at sorted random angles and random radii about a centre: simple, often with reflex points.
-inline Loop RandomStarShaped(std::mt19937& rng, int n, double cx, double cy, double rMin, double rMax)
-{
-    std::uniform_real_distribution<double> radius(rMin, rMax), jitter(0.0, 0.9);
-    Loop points;
-    for (int k = 0; k < n; ++k) {
-        double a = 2 * kPi * (k + jitter(rng)) / n, r = radius(rng);
-        points.push_back(DorVector3(cx + r * std::cos(a), cy + r * std::sin(a), 0));
-    }
-    return points;
-}
-
 struct Mesh {
     Loop v;
     std::vector<int> i;
     int Count() const { return static_cast<int>(i.size()) / 3; }
-    std::set<std::set<int>> Triangles() const
-    {
-        std::set<std::set<int>> set;
-        for (size_t t = 0; t + 2 < i.size(); t += 3)
-            set.insert({i[t], i[t + 1], i[t + 2]});
-        return set;
-    }
 };
 
 inline Mesh MeshOf(const CVelTrianglePolys& g)
@@ -141,7 +121,10 @@ inline double CheckTriangles(const Mesh& m, const DorVector3& normal)
 inline double CheckRing(const Mesh& m, const Loop& outline, const std::vector<Loop>& holes = {})
 {
     double area = CheckTriangles(m, UnitNormal(outline));
-    EXPECT_EQ(m.Triangles().size(), static_cast<size_t>(m.Count())) << "a triangle appears twice";
+    std::set<std::set<int>> triangles;
+    for (size_t t = 0; t + 2 < m.i.size(); t += 3)
+        triangles.insert({m.i[t], m.i[t + 1], m.i[t + 2]});
+    EXPECT_EQ(triangles.size(), static_cast<size_t>(m.Count())) << "a triangle appears twice";
     auto inside = [](const DorVector3& p, const Loop& loop) {
         std::vector<DorVector2> flat;
         for (const DorVector3& q : loop)

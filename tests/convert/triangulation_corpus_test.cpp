@@ -5,6 +5,7 @@
 // ill-formed and non-finite holes) and the holed tolerances; flat and in random planes.
 #include <cmath>
 #include <limits>
+#include <random>
 
 #include "geometry_checks.h"
 #include "reference_triangulations.h"
@@ -12,6 +13,18 @@
 
 namespace {
 typedef std::pair<Loop, std::vector<Loop>> Shape;
+
+// Points at sorted random angles and random radii about a centre: simple, often with reflex points.
+Loop RandomStarShaped(std::mt19937& rng, int n, double cx, double cy, double rMin, double rMax)
+{
+    std::uniform_real_distribution<double> radius(rMin, rMax), jitter(0.0, 0.9);
+    Loop points;
+    for (int k = 0; k < n; ++k) {
+        double a = 2 * kPi * (k + jitter(rng)) / n, r = radius(rng);
+        points.push_back(DorVector3(cx + r * std::cos(a), cy + r * std::sin(a), 0));
+    }
+    return points;
+}
 
 Loop Snapped(std::mt19937& rng, int n, double cx, double cy, double rMin, double rMax)
 {
@@ -85,9 +98,29 @@ std::vector<Shape> RandomHoledShapes()
 }
 }  // namespace
 
+// Besides matching the transcriptions, well-formed rings whatever the way their loops run or their
+// plane, with a point on a chord (the pentagon's point 1 lies on 0-2), and triangles under random
+// rigid moves: n - 2 plain triangles cover the outline once, V + 2 H - 2 holed ones the ring, each
+// counter-clockwise about the outline's normal, stale indices replaced; the holed triangulation
+// lists the outline's vertices then the holes', unchanged, and leaves a bare triangle to its caller.
 TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
 {
-    std::vector<Shape> shapes;
+    const Loop triangle = {DorVector3(1, 1, 0), DorVector3(3, 1, 0), DorVector3(2, 3, 0)};
+    const Loop pentagon = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 2, 0), DorVector3(0, 2, 0)};
+    std::vector<Shape> shapes = {
+        {Square(0, 0, 1), {}}, {Square(0, 0, 1, true), {}}, {LShape(), {}}, {Transformed(LShape(), Tilt()), {}}, {pentagon, {}},
+        {RegularPolygon(60), {}}, {Star(5, 2.0, 0.8), {}}, {Square(0, 0, 4), {triangle}},
+        {Square(0, 0, 4), {{triangle[0], triangle[2], triangle[1]}}}, {Square(0, 0, 4, true), {triangle}},
+        {Transformed(Square(0, 0, 4), Tilt()), {Transformed(triangle, Tilt())}}, {Square(0, 0, 4), {Square(1, 1, 2)}},
+        {Square(0, 0, 7), HoleGrid(2)}, {Square(0, 0, 10), HoleGrid(3)}};
+    std::mt19937 moves(11);
+    std::uniform_real_distribution<double> angle(-kPi, kPi), shift(-50, 50);
+    for (int trial = 0; trial < 5000; ++trial)
+        shapes.push_back({Transformed({DorVector3(0, 0, 0), DorVector3(3, 0, 0), DorVector3(1, 2, 0)},
+                                      DorRotateX(angle(moves)) * DorRotateY(angle(moves)) * DorRotateZ(angle(moves)) *
+                                          DorTranslate(shift(moves), shift(moves), shift(moves))),
+                          {}});
+    const size_t wellFormed = shapes.size();
     for (int n : {8, 13, 40, 42, 60, 100})
         for (const Loop& outline : {RegularPolygon(n), Star(n / 2, 2.0, 1.0), families::Comb(n), families::LPlan(n),
                                     families::SubdividedSquare(n), families::CrossingStar(n + 1, 3)})
@@ -105,8 +138,7 @@ TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
             shape.second.push_back(Snapped(rng, 3 + rng() % 5, h == 1 ? -1.5 : 1.0, 0, 0.5, 1.5));
         shapes.push_back(shape);
     }
-    std::uniform_real_distribution<double> angle(-kPi, kPi);
-    for (size_t k = 0, count = shapes.size(); k < count; ++k) {  // every shape again in a random plane
+    for (size_t k = wellFormed, count = shapes.size(); k < count; ++k) {  // every shape again in a random plane
         DorMatrix4x4 m = DorRotateX(angle(rng)) * DorRotateY(angle(rng)) * DorRotateZ(angle(rng)) * DorTranslate(1, 2, 3);
         Shape moved = {Transformed(shapes[k].first, m), {}};
         for (const Loop& hole : shapes[k].second)
@@ -125,8 +157,47 @@ TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
     for (const std::vector<Shape>& more : {RandomHoledShapes(), FlatOnlyShapes()})
         shapes.insert(shapes.end(), more.begin(), more.end());
     for (size_t k = 0; k < shapes.size(); ++k) {
-        CDorHolePolygon holed = HolePolygon(shapes[k].first, shapes[k].second);
-        ASSERT_EQ(TriangulateHoled(holed).i, reference::TriangulateHoles(holed)) << "shape " << k;
-        ASSERT_EQ(TriangulatePlain(shapes[k].first, false).i, reference::Triangulate(Polygon(shapes[k].first))) << "shape " << k;
+        const Loop& outline = shapes[k].first;
+        const std::vector<Loop>& holes = shapes[k].second;
+        CDorHolePolygon holed = HolePolygon(outline, holes);
+        Mesh m = TriangulateHoled(holed);
+        ASSERT_EQ(m.i, reference::TriangulateHoles(holed)) << "shape " << k;
+        ASSERT_EQ(TriangulatePlain(outline, false).i, reference::Triangulate(Polygon(outline))) << "shape " << k;
+        if (k >= wellFormed)
+            continue;
+        Mesh plain = TriangulatePlain(outline);
+        ASSERT_EQ(plain.Count(), static_cast<int>(outline.size()) - 2) << "shape " << k;
+        ASSERT_NEAR(CheckRing(plain, outline), LoopArea(outline), 1e-9 * LoopArea(outline)) << "shape " << k;
+        Loop vertices = outline;
+        for (const Loop& hole : holes)
+            vertices.insert(vertices.end(), hole.begin(), hole.end());
+        ASSERT_EQ(m.Count(), vertices.size() > 3 ? static_cast<int>(vertices.size() + 2 * holes.size()) - 2 : 0) << "shape " << k;
+        EXPECT_NEAR(CheckRing(m, outline, holes), m.i.empty() ? 0 : RingArea(outline, holes), 1e-9) << "shape " << k;
+        EXPECT_TRUE(std::equal(m.v.begin(), m.v.end(), vertices.begin(), vertices.end(), SamePoint)) << "shape " << k;
     }
+}
+
+// Without a normal (nothing, a point, a segment, collinear or repeated points, a figure eight) the
+// plain triangulation leaves the indices handed in; the holed one never keeps them, gives no
+// triangles for a non-finite outline either, and still lists every vertex.
+TEST(TriangulationCorpus, WithoutANormalNothingIsTriangulated)
+{
+    Loop nanOutline = Square(0, 0, 10);
+    nanOutline[2].x = std::numeric_limits<double>::quiet_NaN();
+    const std::vector<Loop> outlines = {
+        {}, {DorVector3(1, 2, 3)}, {DorVector3(0, 0, 0), DorVector3(1, 0, 0)},
+        {DorVector3(0, 0, 0), DorVector3(1, 1, 1), DorVector3(2, 2, 2)},
+        {DorVector3(4, 4, 4), DorVector3(4, 4, 4), DorVector3(4, 4, 4), DorVector3(4, 4, 4)},
+        {DorVector3(0, 0, 0), DorVector3(1, 1, 0), DorVector3(1, 0, 0), DorVector3(0, 1, 0)}, nanOutline};
+    for (const Loop& outline : outlines) {
+        Mesh m = TriangulateHoled(HolePolygon(outline, {Square(0.2, 0.2, 0.1)}));
+        EXPECT_TRUE(m.i.empty() && m.v.size() == outline.size() + 4) << outline.size() << " points";
+        EXPECT_EQ(TriangulatePlain(outline).i, std::vector<int>{7}) << outline.size() << " points";
+    }
+    CDorArray<DorVector3, DorVector3&> vertices;
+    CDorArray<int, int> indices;
+    TriangulatePolygon(nullptr, indices);
+    indices.Add(7);
+    CVelHolePolygonToPrimitive().TriangulateHolePolygon(nullptr, vertices, indices);
+    EXPECT_EQ(indices.GetSize(), 0);
 }

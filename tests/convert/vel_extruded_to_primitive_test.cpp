@@ -3,33 +3,14 @@
 
 #include "convert/vel_extruded_to_primitive.h"
 #include "convert/vel_hole_extruded_to_primitive.h"
+#include "convert/vel_shape_to_primitive.h"
 #include "geometry_checks.h"
 
 namespace {
-template <class Shape> CVelGroupArray Convert(Shape& shape, CVelGroupArray groups = CVelGroupArray())
+// Either extrusion, through the shape converter's per-kind dispatch.
+CVelGroupArray Convert(CDorGeometry& shape, CVelGroupArray groups = CVelGroupArray())
 {
-    CVelExtrudedToPrimitive().ConvertExtruded(&shape, groups);
-    return groups;
-}
-template <> CVelGroupArray Convert(CDorHoleExtruded& shape, CVelGroupArray groups)
-{
-    CVelHoleExtrudedToPrimitive().ConvertHoleExtruded(&shape, groups);
-    return groups;
-}
-
-// A prism from bottom loops and a height, plain without holes; the host's outline afterwards.
-CVelGroupArray ConvertPrism(const Loop& outline, const std::vector<Loop>& holes, const DorVector3& height, int style,
-                            int caps, Loop* outlineAfter = nullptr)
-{
-    CDorExtruded plain(Polygon(outline), height);
-    CDorHoleExtruded holed(HolePolygon(outline, holes), height);
-    plain.style = holed.style = style;
-    plain.bottomCap = holed.bottomCap = caps & 1;
-    plain.topCap = holed.topCap = caps & 2;
-    CVelGroupArray groups = holes.empty() ? Convert(plain) : Convert(holed);
-    const CDorArray<DorVector3, DorVector3&>& after = holes.empty() ? plain.bottom.points : holed.bottom.points;
-    if (outlineAfter)
-        *outlineAfter = Loop(after.GetData(), after.GetData() + after.GetSize());
+    CVelShapeToPrimitive().ConvertGeometry(&shape, groups);
     return groups;
 }
 
@@ -100,36 +81,36 @@ TEST(ExtrudedToPrimitive, PrismsWhicheverWayTheirLoopsRun)
         DorVector3 height;
         int style, caps;
         Loop after;  // the outline as the host holds it afterwards
-    } cases[] = {{Square(0, 0, 1), {}, z, DorStyleSolid, 3, Square(0, 0, 1)},
-                 {Square(0, 0, 1, true), {}, z, DorStyleSolid, 3, Square(0, 0, 1)},
-                 {Square(0, 0, 1), {}, z, DorStyleSolid, 0, Square(0, 0, 1)},
+    } cases[] = {{Square(0, 0, 1, true), {}, z, DorStyleSolid, 3, Square(0, 0, 1)},
                  {Square(0, 0, 1), {}, z, DorStyleSolid, 2, Square(0, 0, 1)},
                  {Square(0, 0, 1, true), {}, z, DorStyleWire, 3, Square(0, 0, 1, true)},
-                 {Square(0, 0, 1), {}, z, DorStyleWire, 0, Square(0, 0, 1)},
                  {wall, {}, y, DorStyleSolid, 3, wall},
-                 {Square(0, 0, 4), {Square(1, 1, 2)}, z, DorStyleSolid, 3, Square(0, 0, 4)},
                  {Square(0, 0, 4, true), {Square(1, 1, 2, true)}, z, DorStyleSolid, 3, Square(0, 0, 4)},
                  {Square(0, 0, 4), {Square(1, 1, 2)}, z, DorStyleSolid, 1, Square(0, 0, 4)},
                  {Square(0, 0, 4), {Square(1, 1, 1), triangle}, z, DorStyleSolid, 3, Square(0, 0, 4)},
-                 {Square(0, 0, 4), {Square(1, 1, 1), triangle}, z, DorStyleWire, 0, Square(0, 0, 4)},
-                 {Square(0, 0, 4, true), {Square(1, 1, 2)}, z, DorStyleWire, 3, Square(0, 0, 4, true)},
+                 {Square(0, 0, 4, true), {Square(1, 1, 1), triangle}, z, DorStyleWire, 3, Square(0, 0, 4, true)},
                  {wall, {window}, y, DorStyleSolid, 3, wall},
                  {reversedWall, {window}, y, DorStyleSolid, 3, reversedWall}};
     for (size_t k = 0; k < sizeof cases / sizeof cases[0]; ++k) {
         SCOPED_TRACE(::testing::Message() << "case " << k);
         const auto& c = cases[k];
-        Loop after;
-        CVelGroupArray groups = ConvertPrism(c.outline, c.holes, c.height, c.style, c.caps, &after);
+        CDorExtruded plain(Polygon(c.outline), c.height);
+        CDorHoleExtruded holed(HolePolygon(c.outline, c.holes), c.height);
+        plain.style = holed.style = c.style;
+        plain.bottomCap = holed.bottomCap = c.caps & 1;
+        plain.topCap = holed.topCap = c.caps & 2;
+        CVelGroupArray groups = c.holes.empty() ? Convert(plain) : Convert(holed);
+        const CDorArray<DorVector3, DorVector3&>& after = c.holes.empty() ? plain.bottom.points : holed.bottom.points;
         std::vector<Loop> loops = {c.after};
         loops.insert(loops.end(), c.holes.begin(), c.holes.end());
         ExpectPrism(groups, loops, c.height, c.style == DorStyleWire, c.caps);
-        EXPECT_TRUE(std::equal(after.begin(), after.end(), c.after.begin(), c.after.end(), SamePoint));
+        EXPECT_TRUE(std::equal(after.GetData(), after.GetData() + after.GetSize(), c.after.begin(), c.after.end(), SamePoint));
     }
 }
 
 // Walls carry the head's look, caps their own profile's; groups already in the array are reused
-// as they are; outlines of unequal size leave the array alone, unjoinable hole pairs add nothing.
-TEST(ExtrudedToPrimitive, LooksTheGroupsArrayAndUnequalLoops)
+// as they are.
+TEST(ExtrudedToPrimitive, WallsTakeTheHeadsLookAndCapsTheirProfiles)
 {
     CDorExtruded cube(Polygon(Square(0, 0, 1)), DorVector3(0, 0, 1));
     cube.material.shininess = 5;
@@ -144,28 +125,50 @@ TEST(ExtrudedToPrimitive, LooksTheGroupsArrayAndUnequalLoops)
     groups[0].OverlayFlag = 1;
     groups = Convert(cube, groups);
     EXPECT_TRUE(Layout(groups) == "T4 T4 T4 T4" && groups[0].lineWidth == 3.0f && groups[0].OverlayFlag == 1);
-    cube.top.AddPoint(DorVector3(0.5, 0.5, 1));
-    CDorHoleExtruded block(HolePolygon(Square(0, 0, 4), {{}, Square(1, 1, 1), Square(2.5, 2.5, 1)}), DorVector3(0, 0, 1)), unequal = block;
+}
+
+// Outlines of unequal size leave the array alone; hole pairs that cannot be joined (an empty
+// loop, unequal loops, no top loop) add nothing; an empty profile has no point 0 to close a wire
+// with; a single point still makes a wall, a flat profile a whole prism. Unknown styles give nothing.
+TEST(ExtrudedToPrimitive, ProfilesThatCannotBeJoined)
+{
+    CDorExtruded unequal(Polygon(Square(0, 0, 1)), DorVector3(0, 0, 1)), empty;
+    CDorExtruded dot(CDorPolygon({DorVector3(1, 1, 1)}), DorVector3(0, 0, 1)), flat(Polygon(Square(0, 0, 1)), DorVector3());
+    unequal.top.AddPoint(DorVector3(0.5, 0.5, 1));
+    CDorHoleExtruded block(HolePolygon(Square(0, 0, 4), {{}, Square(1, 1, 1), Square(2.5, 2.5, 1)}), DorVector3(0, 0, 1));
+    CDorHoleExtruded unequalHoled = block;
+    unequalHoled.top.points.SetSize(5);
     block.material.shininess = 3;
     block.top.holes[1].points.SetSize(3);
     block.top.holes.SetSize(2);  // the third pair has no top loop
-    unequal.top.points.SetSize(5);
+    const struct {
+        CDorGeometry* shape;
+        const char *solid, *wire;
+    } cases[] = {{&unequal, "", ""}, {&unequalHoled, "", ""}, {&empty, "", ""}, {&dot, "T4", "L4 S2 S2"},
+                 {&flat, "T4 T4 T4 T4 I4 I4", "L4 L4 L4 L4 S5 S5"}, {&block, "T4 T4 T4 T4 I12 I7", "L4 L4 L4 L4 S5 S5"}};
     CVelGroupArray two;
     two.SetSize(2);
     two[1].GroupType = VelGroupPoints;
-    for (int style : {DorStyleSolid, DorStyleWire}) {
-        cube.style = block.style = unequal.style = style;
-        EXPECT_EQ(Layout(Convert(cube, groups)), "T4 T4 T4 T4");
-        EXPECT_EQ(Layout(Convert(unequal, two)), "T0 P0");
+    for (int style : {0, 1, 3}) {  // solid, wire, unknown
+        for (size_t k = 0; k < sizeof cases / sizeof cases[0]; ++k) {
+            cases[k].shape->style = style;
+            EXPECT_EQ(Layout(Convert(*cases[k].shape)), style == DorStyleSolid ? cases[k].solid : style == DorStyleWire ? cases[k].wire : "")
+                << "case " << k << ", style " << style;
+        }
+        EXPECT_TRUE(Layout(Convert(unequal, two)) == "T0 P0" && Layout(Convert(unequalHoled, two)) == "T0 P0");
         CVelGroupArray walls = Convert(block);
-        EXPECT_EQ(Layout(walls), style == DorStyleSolid ? "T4 T4 T4 T4 I12 I7" : "L4 L4 L4 L4 S5 S5");
-        for (int g = 0; g < (style == DorStyleSolid ? 4 : walls.GetSize()); ++g)
+        for (int g = 0; g < walls.GetSize() && (style == DorStyleWire || g < 4); ++g)
             EXPECT_TRUE(walls[g].material.shininess == 3.0f && walls[g].RenderKind == VelRenderLit && walls[g].texture == 0u) << g;
     }
+    CVelGroupArray groups;
+    CVelExtrudedToPrimitive().ConvertExtruded(nullptr, groups);
+    CVelHoleExtrudedToPrimitive().ConvertHoleExtruded(nullptr, groups);
+    EXPECT_EQ(groups.GetSize(), 0);
 }
 
 // A textured head textures the walls, not the caps: a wall spans its size / scale along each
-// texture direction; an axis turns the texture so that u runs up the wall.
+// texture direction; an axis turns the texture so that u runs up the wall. A frustum's walls
+// follow the actual point pairs.
 TEST(ExtrudedToPrimitive, WallsCarryTheHeadsTexture)
 {
     CDorExtruded cube(Polygon(Square(0, 0, 1)), DorVector3(0, 0, 1));
@@ -186,33 +189,7 @@ TEST(ExtrudedToPrimitive, WallsCarryTheHeadsTexture)
     for (int i = 0; i < 4; ++i)  // vertex 0 is top i, vertex 1 bottom i: one unit up the axis
         EXPECT_TRUE(Near(DorVector3(walls[i].vertices[0].texcoord.x, walls[i].vertices[0].texcoord.y, 0),
                          DorVector3(walls[i].vertices[1].texcoord.x + 2, walls[i].vertices[1].texcoord.y, 0), 1e-9)) << i;
-}
-
-// A frustum's walls follow the actual point pairs; empty, one-point and flat profiles give what
-// they can; unknown styles give nothing.
-TEST(ExtrudedToPrimitive, TaperedAndDegenerateProfiles)
-{
     CDorExtruded frustum(Polygon(Square(0, 0, 1)), Polygon(Transformed(Square(0.25, 0.25, 0.5), DorTranslate(0, 0, 1))));
     DorVector3 n = Convert(frustum)[0].vertices[0].normal;  // wall 0 leans outward and up
     EXPECT_TRUE(n.y < 0 && n.z > 0 && std::fabs(DorLength(n) - 1) < 1e-12);
-    const struct {
-        CDorExtruded shape;
-        int solid, wire;  // groups made
-    } cases[] = {{CDorExtruded(), 0, 0},
-                 {CDorExtruded(CDorPolygon({DorVector3(1, 1, 1)}), DorVector3(0, 0, 1)), 1, 3},
-                 {CDorExtruded(Polygon(Square(0, 0, 1)), DorVector3(0, 0, 0)), 6, 6}};
-    for (const auto& c : cases) {
-        for (int style : {0, 1, 3}) {
-            CDorExtruded shape = c.shape;
-            shape.SetStyle(style);
-            EXPECT_EQ(Convert(shape).GetSize(), style == DorStyleSolid ? c.solid : style == DorStyleWire ? c.wire : 0)
-                << style << ", " << c.shape.bottom.points.GetSize() << " points";
-        }
-    }
-    CDorHoleExtruded block(HolePolygon(Square(0, 0, 4), {Square(1, 1, 2)}), DorVector3(0, 0, 1));
-    block.style = 3;
-    CVelGroupArray groups = Convert(block);
-    CVelExtrudedToPrimitive().ConvertExtruded(nullptr, groups);
-    CVelHoleExtrudedToPrimitive().ConvertHoleExtruded(nullptr, groups);
-    EXPECT_EQ(groups.GetSize(), 0);
 }

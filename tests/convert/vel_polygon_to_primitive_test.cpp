@@ -5,9 +5,8 @@
 #include "geometry_checks.h"
 
 namespace {
-CVelGroupArray ConvertFace(CDorGeometry& face, int reverse)
+CVelGroupArray ConvertFace(CDorGeometry& face, int reverse, CVelGroupArray groups = CVelGroupArray())
 {
-    CVelGroupArray groups;
     if (face.kind == DorKindPolygon)
         CVelPolygonToPrimitive().ConvertPolygon(static_cast<CDorPolygon*>(&face), groups, reverse);
     else
@@ -15,67 +14,81 @@ CVelGroupArray ConvertFace(CDorGeometry& face, int reverse)
     return groups;
 }
 
+typedef std::vector<Loop> Loops;
 const Loop kHole = {DorVector3(1, 1, 0), DorVector3(3, 1, 0), DorVector3(2, 3, 0)};
 }  // namespace
 
-// Solid: one lit indexed group over the outline's then the holes' vertices, counter-clockwise
-// about the face's normal and covering it; reverse 1 turns the normal and every triple, any other
-// value is the front. Wire: a line loop per outline (the plain polygon's twice) and per hole,
-// closed by its first point, untextured; only the normal turns. Other styles give nothing.
-TEST(FaceToPrimitive, SolidAndWireFrontAndBack)
+// Solid, then wire, appended. Solid: one lit indexed group over the outline's then the holes'
+// vertices, counter-clockwise about the face's normal and covering it; reverse 1 turns the normal
+// and every triple, any other value is the front. Without a normal the plain converter makes no
+// face, the holed one still gives hosts the first three points and the normal unnormalised. Wire:
+// a line loop per outline (the plain polygon's twice) and per hole, closed by its first point,
+// untextured; an empty holed loop stays an empty strip. Other styles give nothing.
+TEST(FaceToPrimitive, SolidThenWireFrontAndBack)
 {
-    CDorPolygon square = Polygon(Square(0, 0, 1));
-    CDorHolePolygon holed = HolePolygon(Square(0, 0, 4), {kHole});
-    square.material.shininess = 12;
-    holed.material.shininess = 9;
+    const Loop line = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0)};
+    const DorVector3 up(0, 0, 1);
     const struct {
-        CDorGeometry* face;
-        std::vector<Loop> loops, wire;
-        int triangles;
-        double area;
-    } faces[] = {{&square, {Square(0, 0, 1)}, {Square(0, 0, 1), Square(0, 0, 1)}, 2, 1.0},
-                 {&holed, {Square(0, 0, 4), kHole}, {Square(0, 0, 4), kHole}, 7, 14.0}};
-    for (const auto& f : faces) {
-        SCOPED_TRACE(f.triangles);
-        Loop points;
-        for (const Loop& loop : f.loops)
-            points.insert(points.end(), loop.begin(), loop.end());
-        f.face->style = DorStyleSolid;
-        CVelGroupArray front = ConvertFace(*f.face, 0), back = ConvertFace(*f.face, 1), other = ConvertFace(*f.face, 7);
-        ASSERT_TRUE(Layout(front) == "I" + std::to_string(points.size()) && Layout(back) == Layout(front));
-        Mesh m = MeshOf(front[0]);
-        EXPECT_TRUE(m.Count() == f.triangles && MeshOf(other[0]).i == m.i);
-        for (size_t t = 0; t < m.i.size(); t += 3)
-            std::swap(m.i[t], m.i[t + 2]);
-        EXPECT_EQ(MeshOf(back[0]).i, m.i);
-        for (double z : {1, -1}) {
-            const CVelTrianglePolys& g = z > 0 ? front[0] : back[0];
-            EXPECT_NEAR(CheckTriangles(MeshOf(g), DorVector3(0, 0, z)), f.area, 1e-12);
-            EXPECT_TRUE(g.material.shininess == f.face->material.shininess && g.RenderKind == VelRenderLit && g.texture == 0u);
-            for (size_t k = 0; k < points.size(); ++k)  // an untextured polygon still gets planar coordinates, a holed one none
-                EXPECT_TRUE(Near(g.vertices[k].normal, DorVector3(0, 0, z)) && SamePoint(g.vertices[k].position, points[k]) &&
-                            (z < 0 || g.vertices[k].texcoord.x == (f.face == &square ? points[k].x : 0.0))) << k;
-        }
-        f.face->style = DorStyleWire;
-        f.face->SetTexture(9);
-        for (int reverse : {0, 1}) {
-            CVelGroupArray groups = ConvertFace(*f.face, reverse);
-            ASSERT_EQ(groups.GetSize(), static_cast<int>(f.wire.size()));
-            for (size_t l = 0; l < f.wire.size(); ++l) {
-                const CVelTrianglePolys& g = groups[static_cast<int>(l)];
-                ASSERT_TRUE(g.GroupType == VelGroupLines && g.vertices.GetSize() == static_cast<int>(f.wire[l].size()) + 1) << l;
-                for (int k = 0; k < g.vertices.GetSize(); ++k)
-                    EXPECT_TRUE(SamePoint(g.vertices[k].position, f.wire[l][k % f.wire[l].size()]) &&
-                                Near(g.vertices[k].normal, DorVector3(0, 0, reverse ? -1 : 1))) << l << ", " << k;
-                EXPECT_TRUE(g.material.shininess == f.face->material.shininess && g.RenderKind == VelRenderLit && g.texture == 0u);
+        Loop outline;
+        std::vector<Loop> holes;
+        const char *plain, *holed;  // the layouts made
+        DorVector3 normal;          // of the front
+    } cases[] = {{{}, {}, "", "S0", DorVector3()},
+                 {{DorVector3(1, 2, 3)}, {}, "L2 L2", "L2", DorVector3()},
+                 {{line[0], line[1]}, {}, "L3 L3", "L3", DorVector3()},
+                 {line, {}, "L4 L4", "I3 L4", DorVector3()},
+                 {{line[0], line[1], DorVector3(2, 1e-6, 0)}, {}, "L4 L4", "I3 L4", up * 1e-6},
+                 {{line[0], DorVector3(3, 0, 0), DorVector3(1, 2, 0)}, {}, "I3 L4 L4", "I3 L4", up},
+                 {Square(0, 0, 1), {}, "I4 L5 L5", "I4 L5", up},
+                 {Square(0, 0, 4), {kHole}, "I4 L5 L5", "I7 L5 L4", up},
+                 {Square(0, 0, 4), {{}, {DorVector3(2, 2, 0)}, Square(1, 1, 1)}, "I4 L5 L5", "I9 L5 S0 L2 L5", up}};
+    for (const auto& c : cases) {
+        SCOPED_TRACE(::testing::Message() << c.outline.size() << " points, " << c.holes.size() << " holes");
+        CDorPolygon plain = Polygon(c.outline);
+        CDorHolePolygon holed = HolePolygon(c.outline, c.holes);
+        for (int run = 0; run < 6; ++run) {  // front, back, front again, plain then holed
+            const int reverse = run % 3 == 2 ? 7 : run % 3;
+            CDorGeometry* face = run < 3 ? static_cast<CDorGeometry*>(&plain) : &holed;
+            std::vector<Loop> loops = {c.outline, c.outline};  // drawn as wire
+            Loop vertices = c.outline;
+            if (face == &holed) {
+                loops.assign(1, c.outline);
+                loops.insert(loops.end(), c.holes.begin(), c.holes.end());
+                for (const Loop& hole : c.holes)
+                    vertices.insert(vertices.end(), hole.begin(), hole.end());
+            }
+            face->material.shininess = 9;
+            face->SetStyle(DorStyleSolid);
+            face->SetTexture(0);
+            CVelGroupArray groups = ConvertFace(*face, reverse);
+            face->SetStyle(DorStyleWire);
+            face->SetTexture(9);
+            groups = ConvertFace(*face, reverse, groups);
+            face->SetStyle(2);
+            EXPECT_EQ(Layout(ConvertFace(*face, reverse, groups)), face == &plain ? c.plain : c.holed) << reverse;
+            const DorVector3 normal = c.normal * (reverse == 1 ? -1.0 : 1.0);
+            for (int g = 0, l = 0; g < groups.GetSize(); ++g) {
+                const CVelTrianglePolys& group = groups[g];
+                EXPECT_TRUE(group.material.shininess == 9.0f && group.RenderKind == VelRenderLit && group.texture == 0u);
+                const bool solid = group.GroupType == VelGroupIndexed;
+                const Loop& points = solid ? vertices : loops[l++];
+                for (int k = 0; k < group.vertices.GetSize(); ++k) {  // an untextured polygon still gets planar coordinates
+                    const _VelVertex& v = group.vertices[k];
+                    EXPECT_TRUE(SamePoint(v.position, points[k % points.size()]) && Near(v.normal, normal, 1e-15) &&
+                                (!solid || reverse == 1 || v.texcoord.x == (face == &plain ? points[k].x : 0.0))) << g << ", " << k;
+                }
+                const bool firstThree = solid && DorLength(normal) < 1, covering = solid && !firstThree && c.holes.size() < 3;
+                const std::vector<int> firstThreeIndices = reverse == 1 ? std::vector<int>{2, 1, 0} : std::vector<int>{0, 1, 2};
+                EXPECT_TRUE(!firstThree || MeshOf(group).i == firstThreeIndices);
+                const double area = solid && !firstThree ? CheckTriangles(MeshOf(group), normal) : 0;  // bad holes: only safe
+                EXPECT_TRUE(!covering || std::fabs(area - RingArea(c.outline, face == &holed ? c.holes : Loops())) < 1e-12) << area;
             }
         }
-        f.face->SetTexture(0);
-        for (int style : {2, -1}) {
-            f.face->style = style;
-            EXPECT_EQ(ConvertFace(*f.face, 0).GetSize(), 0);
-        }
     }
+    CVelGroupArray groups;
+    CVelPolygonToPrimitive().ConvertPolygon(nullptr, groups, 0);
+    CVelHolePolygonToPrimitive().ConvertHolePolygon(nullptr, groups, 0);
+    EXPECT_EQ(groups.GetSize(), 0);
 }
 
 // u, v = du.x * x + du.y * y + du.z (and dv) at the corner (x, y) of the face; the holed face
@@ -115,50 +128,4 @@ TEST(FaceToPrimitive, TextureCoordinatesUnderScalesAxesAndOrigins)
         face.SetTexture(1, 0.0, 0.0);
         EXPECT_FALSE(std::isfinite(ConvertFace(face, 1)[0].vertices[1].texcoord.x));
     }
-}
-
-// Degenerate plain outlines give nothing solid; wire draws whatever points there are. Groups are
-// appended after what is there.
-TEST(FaceToPrimitive, DegenerateOutlinesAndAppending)
-{
-    CVelPolygonToPrimitive converter;
-    CDorPolygon line({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0)}), empty, dot({DorVector3(1, 2, 3)});
-    CDorPolygon square = Polygon(Square(0, 0, 1));
-    CVelGroupArray groups;
-    for (CDorPolygon* p : {&line, &empty, static_cast<CDorPolygon*>(nullptr)})
-        converter.ConvertPolygon(p, groups, 0);
-    EXPECT_EQ(groups.GetSize(), 0);
-    line.style = empty.style = dot.style = DorStyleWire;
-    for (CDorPolygon* p : {&line, &empty, &dot, &square})
-        converter.ConvertPolygon(p, groups, 1);
-    EXPECT_EQ(Layout(groups), "L4 L4 L2 L2 I4");
-    EXPECT_EQ(DorLength(groups[0].vertices[0].normal), 0.0);
-}
-
-// Without holes a bare triangle is drawn as the triangle 0, 1, 2 itself, a nearly collinear one
-// with its normal unnormalised; fewer than three vertices give nothing; bad holes stay safe.
-TEST(FaceToPrimitive, HoledFallbacksAndBadHoles)
-{
-    CVelHolePolygonToPrimitive converter;
-    CVelGroupArray groups;
-    CDorHolePolygon triangle = HolePolygon({DorVector3(0, 0, 0), DorVector3(3, 0, 0), DorVector3(1, 2, 0)}, {});
-    CDorHolePolygon sliver = HolePolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 1e-6, 0)}, {});
-    CDorHolePolygon segment = HolePolygon({DorVector3(0, 0, 0), DorVector3(1, 0, 0)}, {});
-    converter.ConvertHolePolygon(&triangle, groups, 0);
-    converter.ConvertHolePolygon(&sliver, groups, 1);
-    converter.ConvertHolePolygon(&segment, groups, 0);
-    converter.ConvertHolePolygon(nullptr, groups, 0);
-    ASSERT_EQ(Layout(groups), "I3 I3");
-    EXPECT_EQ(MeshOf(groups[0]).i, std::vector<int>({0, 1, 2}));
-    EXPECT_EQ(MeshOf(groups[1]).i, std::vector<int>({2, 1, 0}));
-    EXPECT_TRUE(Near(groups[1].vertices[0].normal, DorVector3(0, 0, -1e-6), 1e-18));
-    CDorHolePolygon holes = HolePolygon(Square(0, 0, 4), {{}, {DorVector3(2, 2, 0)}, Square(1, 1, 1)});
-    groups.SetSize(0);
-    converter.ConvertHolePolygon(&holes, groups, 0);
-    ASSERT_EQ(Layout(groups), "I9");
-    CheckTriangles(MeshOf(groups[0]), DorVector3(0, 0, 1));
-    holes.style = DorStyleWire;
-    groups.SetSize(0);
-    converter.ConvertHolePolygon(&holes, groups, 0);
-    EXPECT_EQ(Layout(groups), "L5 S0 L2 L5");  // an empty loop has nothing to close; a point is a zero-length segment
 }
