@@ -6,13 +6,64 @@
 #include <cmath>
 #include <limits>
 #include <random>
+#include <set>
 
+#include "convert/vel_plane2d.h"
+#include "convert/vel_polygon_triangulation.h"
 #include "geometry_checks.h"
 #include "reference_triangulations.h"
 #include "triangulation_families.h"
 
 namespace {
 typedef std::pair<Loop, std::vector<Loop>> Shape;
+
+// Both triangulations are handed a stale index unless told otherwise: a result must replace it.
+Mesh TriangulatePlain(const Loop& outline, bool stale = true)
+{
+    CDorPolygon polygon = Polygon(outline);
+    CDorArray<int, int> indices;
+    if (stale)
+        indices.Add(7);
+    TriangulatePolygon(&polygon, indices);
+    return Mesh{outline, std::vector<int>(indices.GetData(), indices.GetData() + indices.GetSize())};
+}
+
+Mesh TriangulateHoled(const CDorHolePolygon& shape)
+{
+    CDorArray<DorVector3, DorVector3&> vertices;
+    CDorArray<int, int> indices;
+    indices.Add(7);
+    CVelHolePolygonToPrimitive().TriangulateHolePolygon(&shape, vertices, indices);
+    return Mesh{Loop(vertices.GetData(), vertices.GetData() + vertices.GetSize()),
+                std::vector<int>(indices.GetData(), indices.GetData() + indices.GetSize())};
+}
+
+// CheckTriangles about the outline's normal, no triangle twice and, for an outline in z = 0,
+// no triangle centred outside the outline or in a hole; returns the area.
+double CheckRing(const Mesh& m, const Loop& outline, const std::vector<Loop>& holes = {})
+{
+    double area = CheckTriangles(m, UnitNormal(outline));
+    std::set<std::set<int>> triangles;
+    for (size_t t = 0; t + 2 < m.i.size(); t += 3)
+        triangles.insert({m.i[t], m.i[t + 1], m.i[t + 2]});
+    EXPECT_EQ(triangles.size(), static_cast<size_t>(m.Count())) << "a triangle appears twice";
+    auto inside = [](const DorVector3& p, const Loop& loop) {
+        std::vector<DorVector2> flat;
+        for (const DorVector3& q : loop)
+            flat.push_back(DorVector2(q.x, q.y));
+        return VelWindingInside(VelWindingAngle(DorVector2(p.x, p.y), flat.data(), static_cast<int>(flat.size())));
+    };
+    bool flat = true;
+    for (const DorVector3& p : outline)
+        flat = flat && p.z == 0;
+    for (size_t t = 0; flat && area >= 0 && t + 2 < m.i.size(); t += 3) {
+        DorVector3 centre = (m.v[m.i[t]] + m.v[m.i[t + 1]] + m.v[m.i[t + 2]]) * (1.0 / 3);
+        EXPECT_TRUE(inside(centre, outline)) << "triangle " << t / 3 << " lies outside the outline";
+        for (size_t h = 0; h < holes.size(); ++h)
+            EXPECT_FALSE(inside(centre, holes[h])) << "triangle " << t / 3 << " lies in hole " << h;
+    }
+    return area;
+}
 
 // Points at sorted random angles and random radii about a centre: simple, often with reflex points.
 Loop RandomStarShaped(std::mt19937& rng, int n, double cx, double cy, double rMin, double rMax)
@@ -106,12 +157,13 @@ std::vector<Shape> RandomHoledShapes()
 TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
 {
     const Loop triangle = {DorVector3(1, 1, 0), DorVector3(3, 1, 0), DorVector3(2, 3, 0)};
+    const DorMatrix4x4 tilt = DorRotateX(0.7) * DorRotateY(-1.1) * DorRotateZ(2.3) * DorTranslate(5, -3, 8);
     const Loop pentagon = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0), DorVector3(2, 2, 0), DorVector3(0, 2, 0)};
     std::vector<Shape> shapes = {
-        {Square(0, 0, 1), {}}, {Square(0, 0, 1, true), {}}, {LShape(), {}}, {Transformed(LShape(), Tilt()), {}}, {pentagon, {}},
+        {Square(0, 0, 1), {}}, {Square(0, 0, 1, true), {}}, {LShape(), {}}, {Transformed(LShape(), tilt), {}}, {pentagon, {}},
         {RegularPolygon(60), {}}, {Star(5, 2.0, 0.8), {}}, {Square(0, 0, 4), {triangle}},
         {Square(0, 0, 4), {{triangle[0], triangle[2], triangle[1]}}}, {Square(0, 0, 4, true), {triangle}},
-        {Transformed(Square(0, 0, 4), Tilt()), {Transformed(triangle, Tilt())}}, {Square(0, 0, 4), {Square(1, 1, 2)}},
+        {Transformed(Square(0, 0, 4), tilt), {Transformed(triangle, tilt)}}, {Square(0, 0, 4), {Square(1, 1, 2)}},
         {Square(0, 0, 7), HoleGrid(2)}, {Square(0, 0, 10), HoleGrid(3)}};
     std::mt19937 moves(11);
     std::uniform_real_distribution<double> angle(-kPi, kPi), shift(-50, 50);
