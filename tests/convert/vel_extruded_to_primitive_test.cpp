@@ -152,8 +152,8 @@ TEST(ExtrudedToPrimitive, ProfilesThatCannotBeJoined)
     for (int style : {0, 1, 3}) {  // solid, wire, unknown
         for (size_t k = 0; k < sizeof cases / sizeof cases[0]; ++k) {
             cases[k].shape->style = style;
-            EXPECT_EQ(Layout(Convert(*cases[k].shape)), style == DorStyleSolid ? cases[k].solid : style == DorStyleWire ? cases[k].wire : "")
-                << "case " << k << ", style " << style;
+            const char* expected = style == DorStyleSolid ? cases[k].solid : style == DorStyleWire ? cases[k].wire : "";
+            EXPECT_EQ(Layout(Convert(*cases[k].shape)), expected) << "case " << k << ", style " << style;
         }
         EXPECT_TRUE(Layout(Convert(unequal, two)) == "T0 P0" && Layout(Convert(unequalHoled, two)) == "T0 P0");
         CVelGroupArray walls = Convert(block);
