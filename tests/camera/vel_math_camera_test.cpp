@@ -8,7 +8,7 @@
 #include "support/camera_bits.h"
 
 namespace {
-const double kNaN = std::numeric_limits<double>::quiet_NaN(), kInf = std::numeric_limits<double>::infinity(), kH = std::sqrt(0.5);
+const double kInf = std::numeric_limits<double>::infinity(), kH = std::sqrt(0.5);
 
 enum Op { Pan, Dolly, Fly, Round };
 void Apply(_VelCamera& c, Op op, double a, double b, double d, int eyeOnly)

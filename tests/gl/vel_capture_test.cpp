@@ -31,6 +31,9 @@ TEST(CaptureBitmap, OddWidthRowsArePaddedToFourBytesInTheReservedBits)
         const int row = i / 304, column = i % 304 / 3, part = i % 304 % 3;
         EXPECT_EQ(bitmap.bits[i], column == 101 ? 0 : part == 0 ? column : part == 1 ? row : 200) << row << "," << column;
     }
+    _DorBitmap unreserved;  // completing sizes the bits itself
+    VelCompleteCaptureBitmap(unreserved, 101, 50, rows.data());
+    EXPECT_TRUE(unreserved.bits.GetSize() == 304 * 50 && unreserved.bits[304 * 50 - 2] == 200);
 }
 
 TEST(CaptureSize, ZeroOversizedAndUnaddressableAreRefused)

@@ -32,7 +32,6 @@ TEST(DorList, HandlesStayValidFreedNodesAreReusedFirstAndTheLastRemovalFreesTheB
     EXPECT_EQ(list.GetCount(), 12);
     for (int i = 1; i < 25; i += 2)
         EXPECT_EQ(CDorList::GetAt(handle[i]), &v[i]);
-    EXPECT_EQ(Contents(list), (std::vector<int>{1, 3, 5, 7, 9, 11, 13, 15, 17, 19, 21, 23}));
     EXPECT_EQ(list.AddTail(&v[0]), handle[24]);
     for (int i = 0; i < 23; i += 2)
         list.RemoveAt(i ? handle[i - 1] : handle[24]);
@@ -44,8 +43,8 @@ TEST(DorList, HandlesStayValidFreedNodesAreReusedFirstAndTheLastRemovalFreesTheB
 }
 
 // Order under moves and removals is checked against a standard list by the fuzz target; here the
-// quirks: a copy keeps order, assignment takes the block size, and moving the only node frees
-// every block, so the handle written back is a new one.
+// quirks: a copy keeps order, assignment takes the block size (at least 1), and moving the only
+// node frees every block, so the handle written back is a new one.
 TEST(DorList, CopiesKeepOrderAndMovingWritesTheHandleBack)
 {
     int v[3] = {0, 1, 2};
@@ -57,7 +56,7 @@ TEST(DorList, CopiesKeepOrderAndMovingWritesTheHandleBack)
     CDorList copy(list);
     EXPECT_EQ(Contents(copy), (std::vector<int>{2, 0, 1}));
     copy = CDorList(3);
-    EXPECT_TRUE(copy.GetCount() == 0 && copy.blockSize == 3);
+    EXPECT_TRUE(copy.GetCount() == 0 && copy.blockSize == 3 && CDorList(0).blockSize == 1);
     CDorList single;
     _DorPosition* only = single.AddTail(&v[1]);
     single.MoveToHead(only);

@@ -43,7 +43,6 @@ TEST(DirectionAngles, QuadrantsVerticalAndTooShort)
         DorDirectionKind kind;
         double elevation, azimuth;  // the azimuth of DorAzimuth, which falls back to 0
     } rows[] = {
-        {{-1, 0, 0}, DorDirectionSloped, 0, kPi},
         {{-2, 0, 5}, DorDirectionSloped, std::atan(2.5), kPi},
         {{0, -2, 0}, DorDirectionSloped, 0, -kPi / 2},
         {{1, 1, std::sqrt(2.0)}, DorDirectionSloped, kPi / 4, kPi / 4},

