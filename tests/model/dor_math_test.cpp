@@ -36,29 +36,6 @@ TEST(Matrices, RightAnglesAreExactAndTheLeftFactorAppliesFirst)
     EXPECT_EQ(tiny.z, 0.00005);
 }
 
-TEST(DirectionAngles, QuadrantsVerticalAndTooShort)
-{
-    const struct {
-        DorVector3 d;
-        DorDirectionKind kind;
-        double elevation, azimuth;  // the azimuth of DorAzimuth, which falls back to 0
-    } rows[] = {
-        {{-2, 0, 5}, DorDirectionSloped, std::atan(2.5), kPi},
-        {{0, -2, 0}, DorDirectionSloped, 0, -kPi / 2},
-        {{1, 1, std::sqrt(2.0)}, DorDirectionSloped, kPi / 4, kPi / 4},
-        {{0, 0, -3}, DorDirectionVertical, -kPi / 2, 0},
-        {{0.00005, 0, 0.00001}, DorDirectionTooShort, 9, 0},
-    };
-    for (const auto& r : rows) {
-        SCOPED_TRACE(::testing::Message() << r.d.x << "," << r.d.y << "," << r.d.z);
-        double el = 9, az = 9;
-        EXPECT_EQ(DorDirectionAngles(r.d, el, az), r.kind);
-        EXPECT_DOUBLE_EQ(el, r.kind == DorDirectionTooShort ? 9 : r.elevation);
-        EXPECT_DOUBLE_EQ(az, r.kind == DorDirectionSloped ? r.azimuth : r.kind == DorDirectionVertical ? 0 : 9);
-        EXPECT_DOUBLE_EQ(DorAzimuth(r.d), r.azimuth);
-    }
-}
-
 TEST(PlaneProjection, AnchorToExactOriginAndNormalToPlusZWhateverTheRotation)
 {
     std::mt19937 rng(7);
