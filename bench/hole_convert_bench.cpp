@@ -5,11 +5,10 @@
 #include <memory>
 
 #include "convert/convert_test_support.h"
-#include "convert/hole_shapes.h"
 #include "convert/vel_hole_polygon_to_primitive.h"
 #include "convert_bench_support.h"
 
-using namespace hole_test;
+using namespace convert_test;
 
 namespace {
 void Triangulate(benchmark::State& state, const CDorHolePolygon& shape)
@@ -34,7 +33,7 @@ void TriangulateHoleGrid(benchmark::State& state)
 // A 40-point star with three small holes about its centre.
 void TriangulateStar40With3Holes(benchmark::State& state)
 {
-    Triangulate(state, HolePolygon(convert_test::Star(20, 4.0, 3.0),
+    Triangulate(state, HolePolygon(Star(20, 4.0, 3.0),
                                    {Square(-1.5, -0.5, 1), Square(0.5, -0.5, 1), Square(-0.5, 1, 1)}));
 }
 

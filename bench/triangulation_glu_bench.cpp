@@ -100,7 +100,7 @@ class Ours {
 public:
     explicit Ours(const Input& input)
         : plain(input.outline.data(), static_cast<int>(input.outline.size())),
-          holed(hole_test::HolePolygon(input.outline, input.holes)), withHoles(!input.holes.empty())
+          holed(convert_test::HolePolygon(input.outline, input.holes)), withHoles(!input.holes.empty())
     {
     }
     int Run()
@@ -157,7 +157,7 @@ void CrossingStar(benchmark::State& state) { Compare(state, {families::CrossingS
 void SquareWithHoles(benchmark::State& state)
 {
     const int k = N(state);
-    Compare(state, {hole_test::Square(0, 0, 3 * k + 1), hole_test::HoleGrid(k)});
+    Compare(state, {convert_test::Square(0, 0, 3 * k + 1), convert_test::HoleGrid(k)});
 }
 
 void Sizes(benchmark::internal::Benchmark* b, int extra)

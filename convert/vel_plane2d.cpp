@@ -32,20 +32,7 @@ double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count)
     return sum;
 }
 
-double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int* indices, int count)
-{
-    double sum = 0.0;
-    for (int k = 0; k < count; ++k)
-        sum += EdgeAngle(q, points[indices[k]], points[indices[k + 1 < count ? k + 1 : 0]]);
-    return sum;
-}
-
 bool VelWindingInside(double angleSum) { return std::fabs(angleSum) > kPi; }
-
-bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1)
-{
-    return VelSegmentsCrossAlong(p0, VelSub2(p1, p0), a0, VelSub2(a1, a0));
-}
 
 namespace {
 enum Verdict { kOutside, kInside, kUnsure };

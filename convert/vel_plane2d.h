@@ -18,10 +18,6 @@ inline DorVector2 VelMidpoint2(const DorVector2& a, const DorVector2& b)
 // Divides v by its length when that is at least 0.0001.
 void VelNormalize2(DorVector2& v);
 
-// Whether segment p0-p1 crosses segment a0-a1 at a point strictly inside both. Parallel segments
-// (cross product exactly 0) never cross.
-bool VelSegmentsCross(const DorVector2& p0, const DorVector2& p1, const DorVector2& a0, const DorVector2& a1);
-
 // The determinant and the numerators of s and t in p0 + s d = a0 + t e.
 struct VelCrossingTerms {
     double det, sNum, tNum;
@@ -45,8 +41,8 @@ struct VelCrossingTerms {
     }
 };
 
-// The same for p0 + d and a0 + e with d = p1 - p0, e = a1 - a0 already formed.
-// Inline: the triangulations call it for every candidate against every listed edge.
+// Whether segment p0 to p0 + d crosses segment a0 to a0 + e at a point strictly inside both.
+// Parallel segments (cross product exactly 0) never cross. Inline: the triangulations call it for every candidate against every listed edge.
 inline bool VelSegmentsCrossAlong(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
 {
     VelCrossingTerms terms(p0, d, a0, e);
@@ -60,9 +56,6 @@ inline bool VelSegmentsCrossAlong(const DorVector2& p0, const DorVector2& d, con
 // atan2(cross, dot). An edge with an end exactly on q (cross and dot both 0) adds nothing.
 // About +-2 pi inside, about 0 outside.
 double VelWindingAngle(const DorVector2& q, const DorVector2* loop, int count);
-
-// The same sum over the loop loop[indices[0..count-1]], for loops that live in a shared list.
-double VelWindingAngle(const DorVector2& q, const DorVector2* points, const int* indices, int count);
 
 // Bounds of a few points; empty at first. The bounds leave out NaN: finite tells.
 struct VelBox {

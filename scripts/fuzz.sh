@@ -26,7 +26,7 @@ cmake --build --preset fuzz -j "$(karvel_jobs)"
 
 mkdir -p build/fuzz/findings
 status=0
-for target in shape camera generators scene; do
+for target in shape scene; do
   corpus=build/fuzz/corpus/$target
   # A deterministic run starts from the seeds alone, not from what earlier runs found.
   [ $fresh -eq 1 ] && rm -rf "$corpus"

@@ -70,7 +70,7 @@ TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
 }
 
 // A point box keeps the eye's distance; a camera without a direction or with a field of view
-// outside 0..180 degrees is not fitted at all. (Boxes that are not finite are the fuzz target's.)
+// outside 0..180 degrees is not fitted at all.
 TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
 {
     const DorVector3 o(0, 0, 0), south(0, -30, 0), one(1, 1, 1);
@@ -82,6 +82,14 @@ TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
         CVelMathCamera::FitViewToSphere(c, one * -1.0, one);
         CVelMathCamera::FitViewToBox(c, one * -1.0, one);
         EXPECT_TRUE(SameCameraBits(c, before)) << before.fovy;
+    }
+    // Nor is any camera on a box with a corner that is not finite, or too large for doubles.
+    for (const DorVector3& corner : {DorVector3(NAN, 0, 0), DorVector3(0, HUGE_VAL, 0), one * 1e308}) {
+        const _VelCamera before = Camera(south, o, 45, 1);
+        c = before;
+        CVelMathCamera::FitViewToSphere(c, corner * -1.0, corner);
+        CVelMathCamera::FitViewToBox(c, o, corner);
+        EXPECT_TRUE(SameCameraBits(c, before)) << corner.x << " " << corner.y;
     }
 }
 

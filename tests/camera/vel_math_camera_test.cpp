@@ -3,6 +3,7 @@
 #include <cmath>
 #include <limits>
 
+#include "camera/vel_camera_motion.h"
 #include "camera/vel_math_camera.h"
 #include "model/dor_math.h"
 #include "support/camera_bits.h"
@@ -129,5 +130,18 @@ TEST(ApproachCamera, TurnsToHalfThePointedOffsetOrMovesByTheGrowthFactor)
         _VelCamera c = Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0), 90.0);
         CVelMathCamera::ApproachCamera(c, DorVector2(r.px, r.py), 200, r.height, r.depth);
         EXPECT_LE(DorLength(c.eye - r.eye) + DorLength(c.target - r.target), 1e-12) << r.px << "," << r.py;
+    }
+}
+
+// The orbit after elapsed milliseconds: the eye turned counter-clockwise about the target's
+// vertical by the angle reached, whole turns dropped.
+TEST(OrbitCamera, TurnsTheEyeByTheAngleReached)
+{
+    const _VelCamera start = Camera(DorVector3(10, 0, 3), DorVector3(0, 0, 0));
+    const struct { int rate; unsigned int elapsed; double degrees; } rows[] = {{90, 1000, 90}, {-90, 500, -45}, {30, 13000, 30}};
+    for (const auto& r : rows) {
+        const _VelCamera c = VelOrbitCamera(start, r.rate, r.elapsed);
+        const double a = r.degrees * DorPi / 180;
+        EXPECT_LE(DorLength(c.eye - DorVector3(10 * std::cos(a), 10 * std::sin(a), 3)) + DorLength(c.target), 1e-9) << r.elapsed;
     }
 }

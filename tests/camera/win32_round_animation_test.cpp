@@ -1,55 +1,34 @@
-// The timed orbit on a live modeller: it turns the eye about the target until the host says stop.
+// The timed orbit on a real window: it turns the eye about the target until the host says stop.
 #include <gtest/gtest.h>
 
 #include <cmath>
 
 #include "camera/vel_math_camera.h"
-#include "model/dor_math.h"
-#include "support/gl_live_modeller.h"
+#include "support/recording_karvel.h"
+#include "support/win32_test_window.h"
 
 namespace {
-CVelKarvel* orbiting = nullptr;
-int* orbitFlag = nullptr;
-double startAzimuth = 0;
-DWORD orbitBegin = 0;
-
 double Azimuth(const _VelCamera& c) { return std::atan2(c.eye.y - c.target.y, c.eye.x - c.target.x) * 180 / DorPi; }
-
-// A thread timer's callback, dispatched from inside the orbit: the host clearing the flag once the
-// eye has visibly turned, however slowly the frames come. A late tick after the test must not
-// write through a stale pointer.
-void CALLBACK StopOrbit(HWND, UINT, UINT_PTR, DWORD)
-{
-    if (!orbitFlag)
-        return;
-    _VelCamera c;
-    orbiting->GetCamera(c);
-    if (Azimuth(c) - startAzimuth > 10 || GetTickCount() - orbitBegin > 10000)  // or give up
-        *orbitFlag = 0;
-}
 }  // namespace
 
-TEST_F(LiveModeller, OrbitTurnsAboutTheTargetUntilTheFlagIsClearedAndStopsAtAQuit)
+// The host clears the flag from inside a frame (here the tenth); a quit ends the orbit and is
+// posted again for the host; no window or no modeller ends it at once.
+TEST(RoundAnimation, TurnsAboutTheTargetUntilTheFlagIsClearedAndStopsAtAQuit)
 {
-    _VelCamera start, camera;
-    karvel.GetCamera(start);
-    start.eye = DorVector3(0, -10, 5);
-    karvel.SetCamera(start);
+    TestWindow window(64, 64);
+    RecordingKarvel karvel;
+    const _VelCamera start = karvel.camera = Camera(DorVector3(0, -10, 5), DorVector3(0, 0, 0));
     int running = 1;
-    orbiting = &karvel, orbitFlag = &running, startAzimuth = Azimuth(start);
-    UINT_PTR timer = SetTimer(nullptr, 0, 20, StopOrbit);
-    DWORD begin = orbitBegin = GetTickCount();
+    karvel.onDraw = [&] { running = karvel.drawCalls < 10; };
+    const DWORD begin = GetTickCount();
     CVelMathCamera::RoundAnimationStart(&karvel, running, window.hwnd, 90);
-    DWORD spent = GetTickCount() - begin;
-    KillTimer(nullptr, timer);
-    orbitFlag = nullptr;
-    karvel.GetCamera(camera);
-    double turned = Azimuth(camera) - Azimuth(start);  // counter-clockwise, at 90 degrees a second
-    EXPECT_GT(turned, 10);
+    const DWORD spent = GetTickCount() - begin;
+    const double turned = Azimuth(karvel.camera) - Azimuth(start);  // counter-clockwise, at 90 degrees a second
+    EXPECT_EQ(karvel.drawCalls, 10);
+    EXPECT_GT(turned, 90 * 0.016 * 8);  // nine frames of at least 16 ms each have passed
     EXPECT_LT(turned, 90 * (spent + 50) / 1000.0);
-    EXPECT_NEAR(camera.eye.z, start.eye.z, 1e-9);  // about the target's vertical
+    EXPECT_NEAR(karvel.camera.eye.z, start.eye.z, 1e-9);  // about the target's vertical
 
-    // A quit ends it and is posted again for the host; no window ends it at once.
     running = 1;
     PostQuitMessage(7);
     CVelMathCamera::RoundAnimationStart(&karvel, running, window.hwnd, 90);
@@ -58,4 +37,5 @@ TEST_F(LiveModeller, OrbitTurnsAboutTheTargetUntilTheFlagIsClearedAndStopsAtAQui
     EXPECT_EQ(msg.wParam, 7u);
     CVelMathCamera::RoundAnimationStart(&karvel, running, nullptr, 90);
     CVelMathCamera::RoundAnimationStart(nullptr, running, window.hwnd, 90);
+    EXPECT_EQ(karvel.drawCalls, 11);  // the frame before the quit was seen
 }

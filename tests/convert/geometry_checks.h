@@ -9,10 +9,8 @@
 
 #include "convert/vel_hole_polygon_to_primitive.h"
 #include "convert_test_support.h"
-#include "hole_shapes.h"
 
 using namespace convert_test;
-using namespace hole_test;
 
 inline bool SamePoint(const DorVector3& a, const DorVector3& b) { return a.x == b.x && a.y == b.y && a.z == b.z; }
 

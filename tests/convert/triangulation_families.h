@@ -4,7 +4,6 @@
 #include <vector>
 
 #include "convert_test_support.h"
-#include "hole_shapes.h"
 
 namespace families {
 
@@ -46,7 +45,7 @@ inline Loop LPlan(int n)
                       n);
 }
 
-inline Loop SubdividedSquare(int n) { return Subdivided(hole_test::Square(0, 0, 100), n); }
+inline Loop SubdividedSquare(int n) { return Subdivided(convert_test::Square(0, 0, 100), n); }
 
 // Every point joined to the one `step` places on round a circle: each edge crosses 2 (step - 1)
 // others.

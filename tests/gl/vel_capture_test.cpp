@@ -51,5 +51,7 @@ TEST(CaptureSize, ZeroOversizedAndUnaddressableAreRefused)
         _DorBitmap bitmap;
         bitmap.bits.SetSize(3);
         EXPECT_TRUE(!VelReserveCaptureBits(bitmap, size[0], size[1]) && bitmap.bits.GetSize() == 3) << size[0] << "x" << size[1];
+        VelCompleteCaptureBitmap(bitmap, size[0], size[1], nullptr);  // nor completed: emptied
+        EXPECT_TRUE(bitmap.bits.GetSize() == 0 && bitmap.info.width == 0) << size[0] << "x" << size[1];
     }
 }

@@ -226,10 +226,10 @@ TEST(TextureList, PowerOfTwoPixelCountsWithinEachLimitWithWholePixelArrays)
     const struct {
         int width, height, bits, missing;
         bool add, change;
-    } rows[] = {{16, 16, 24, 0, true, true},      {2, 8, 32, 0, true, true},   {1, 64, 1, 0, true, true},
-                {512, 512, 24, 0, true, false},   {3, 5, 24, 0, false, false}, {1, 1, 24, 0, false, false},
-                {1024, 512, 24, 0, false, false}, {16, 16, 8, 0, false, false}, {16, -16, 24, 0, false, false},
-                {4, 4, 24, 1, false, false}};
+    } rows[] = {{16, 16, 24, 0, true, true},    {2, 8, 32, 0, true, true},     {1, 64, 1, 0, true, true},
+                {1, 2, 24, 0, true, true},      {512, 512, 24, 0, true, false}, {3, 5, 24, 0, false, false},
+                {1, 1, 24, 0, false, false},    {1024, 512, 24, 0, false, false}, {16, 16, 8, 0, false, false},
+                {16, -16, 24, 0, false, false}, {4, 4, 24, 1, false, false}};
     CVelGLStructure model;
     _DorBitmap first;
     first.info.width = first.info.height = 2;

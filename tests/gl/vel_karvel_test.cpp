@@ -45,30 +45,6 @@ TEST(KarvelCameraWrappers, EachMoveReadsComputesAndWritesBackOnce)
     EXPECT_TRUE(k.setCameraCalls == 8 && k.camerasAtHitTest.empty());
 }
 
-// The first estimate lies `ahead` units away with a clip range of 1 .. 100000; the second pick
-// sees the range narrowed to 1000 either side and takes the target's own depth when it is hit.
-TEST(KarvelDepthHi, NarrowsTheClipRangeForTheSecondPickAndRestoresTheCamera)
-{
-    const struct {
-        double ahead, zNear, zFar;
-        bool targetHit;
-        double point;
-    } rows[] = {{5000, 4000, 6000, true, 7500}, {5000, 4000, 6000, false, 5000}, {50, 1, 1050, true, 75}};
-    for (const auto& r : rows) {
-        RecordingKarvel k;
-        k.camera.zFar = 100000.0;
-        const _VelCamera before = k.camera;
-        k.depthStep = DorVector3(0, 2 * r.ahead, 0);
-        k.hits = {{k.HandleOf(1), 0.25}, {k.HandleOf(r.targetHit ? 2 : 3), 0.75}};
-        double depth = 0.5;
-        DorVector3 point;
-        k.GetDepthToPoint3_Hi(kDC, k.HandleOf(2), 7, 9, depth, point);
-        ASSERT_TRUE(k.camerasAtHitTest.size() == 1 && k.camerasAtHitTest[0].zNear == r.zNear && k.camerasAtHitTest[0].zFar == r.zFar) << r.ahead;
-        EXPECT_EQ(k.depthsAsked, (r.targetHit ? std::vector<double>{0.5, 0.75} : std::vector<double>{0.5}));
-        EXPECT_TRUE(point.y == r.point && SameCameraBits(k.camera, before) && k.HitTestS(kDC, 5, 5) == k.HandleOf(1)) << r.ahead;
-    }
-}
-
 // Two groups edited through the part flags 2 (material) and 16 (DrawMode); a null handle never
 // reaches the store. (MoveShape's normals are checked on the live modeller.)
 TEST(KarvelEntityEdits, ChangeMaterialReachesEveryGroupAndDrawModeRoundTrips)

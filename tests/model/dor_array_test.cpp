@@ -72,7 +72,7 @@ TEST(DorArray, ElementsLiveOnceAcrossRelocationAndAddSurvivesItsOwnElement)
 }
 
 // Assignment copies the elements into the destination's own capacity, not the source's step.
-// (That copies are deep, the fuzz target and every test that copies a record show.)
+// (That copies are deep, every test that copies a record shows.)
 TEST(DorArray, AssignmentKeepsTheDestinationsCapacity)
 {
     CDorArray<int, int> src, dst;

@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <deque>
+#include <random>
 #include <vector>
 
 #include "model/dor_list.h"
@@ -42,8 +44,42 @@ TEST(DorList, HandlesStayValidFreedNodesAreReusedFirstAndTheLastRemovalFreesTheB
     EXPECT_EQ(Contents(list), std::vector<int>{3});
 }
 
-// Order under moves and removals is checked against a standard list by the fuzz target; here the
-// quirks: a copy keeps order, assignment takes the block size (at least 1), and moving the only
+// Random adds at either end, removals and moves keep the order a standard deque keeps, across
+// blocks of every size and a reset now and then.
+TEST(DorList, OrderUnderAddsRemovalsAndMovesFollowsADeque)
+{
+    std::mt19937 rng(3);
+    int v[8] = {0, 1, 2, 3, 4, 5, 6, 7};
+    for (int blockSize = -1; blockSize <= 4; ++blockSize) {
+        CDorList list(blockSize);
+        std::deque<_DorPosition*> order;
+        for (int step = 0; step < 400; ++step) {
+            const int op = rng() % 6, value = rng() % 8;
+            auto at = order.empty() ? order.end() : order.begin() + rng() % order.size();
+            _DorPosition* p = at == order.end() ? nullptr : *at;
+            if (op == 0 || order.empty())
+                order.push_back(list.AddTail(&v[value]));
+            else if (op == 1)
+                order.push_front(list.AddHead(&v[value]));
+            else if (op == 5 && step % 50 == 0)
+                list.RemoveAll(), order.clear();
+            else {
+                order.erase(at);
+                op == 2 ? list.RemoveAt(p) : op == 3 ? list.MoveToHead(p) : list.MoveToTail(p);
+                op == 3 ? order.push_front(p) : op != 2 ? order.push_back(p) : void();
+            }
+            ASSERT_EQ(list.GetCount(), static_cast<int>(order.size()));
+            _DorPosition* q = list.GetHeadPosition();
+            for (_DorPosition* expected : order) {
+                ASSERT_EQ(q, expected) << "block size " << blockSize << ", step " << step;
+                q = CDorList::GetNextPosition(q);
+            }
+            ASSERT_TRUE(q == nullptr && list.GetTailPosition() == (order.empty() ? nullptr : order.back()));
+        }
+    }
+}
+
+// The quirks: a copy keeps order, assignment takes the block size (at least 1), and moving the only
 // node frees every block, so the handle written back is a new one.
 TEST(DorList, CopiesKeepOrderAndMovingWritesTheHandleBack)
 {

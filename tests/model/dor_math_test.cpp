@@ -71,18 +71,3 @@ TEST(Invert, UndoesARigidMoveAndScalesAndRefusesSingularMatrices)
     }
     EXPECT_EQ(untouched.m[3][0], 9.0);
 }
-
-TEST(TruncateToInt, TowardZeroWithinIntRangeOnly)
-{
-    const struct {
-        double in;
-        bool ok;
-        int out;
-    } rows[] = {{-2.9, true, -2}, {2147483647.9, true, 2147483647}, {-2147483648.9, true, -2147483647 - 1},
-                {2147483648.0, false, 7}, {-2147483649.0, false, 7}, {std::nan(""), false, 7}, {-HUGE_VAL, false, 7}};
-    for (const auto& r : rows) {
-        int out = 7;
-        EXPECT_EQ(DorTruncateToInt(r.in, out), r.ok) << r.in;
-        EXPECT_EQ(out, r.out) << r.in;
-    }
-}

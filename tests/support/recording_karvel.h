@@ -16,14 +16,12 @@ public:
     _VelCamera camera = Camera(DorVector3(0, 0, 0), DorVector3(0, 10, 0));
     _VelViewport viewport = {0, 0, 400, 300};
     HDC current = nullptr;  // GetCurrent
-    // HitTest returns `hits`; GetDepthToPoint3 answers depthStep * depth.
+    // HitTest returns `hits`; GetDepthToPoint3 answers the origin.
     std::vector<_VelSelect> hits;
-    DorVector3 depthStep;
     std::function<void()> onDraw;  // runs inside every DrawModel
 
     int getCameraCalls = 0, setCameraCalls = 0, setViewportCalls = 0, drawCalls = 0;
     std::vector<_VelCamera> camerasAtHitTest;
-    std::vector<double> depthsAsked;
     // Whole primitives under fake handles; flags of the last Get/Change.
     std::map<_DorPosition*, CVelPrimitive> entities;
     long lastGetFlags = 0, lastChangeFlags = 0;
@@ -53,11 +51,7 @@ public:
         for (_VelSelect hit : hits)
             out.Add(hit);
     }
-    void GetDepthToPoint3(HDC, int, int, double& depth, DorVector3& point) override
-    {
-        depthsAsked.push_back(depth);
-        point = depthStep * depth;
-    }
+    void GetDepthToPoint3(HDC, int, int, double&, DorVector3& point) override { point = DorVector3(); }
     _DorPosition* AddPrimitive(CVelPrimitive& primitive) override
     {
         _DorPosition* handle = HandleOf(static_cast<int>(entities.size()));
