@@ -65,8 +65,12 @@ TEST(DorList, OrderUnderAddsRemovalsAndMovesFollowsADeque)
                 list.RemoveAll(), order.clear();
             else {
                 order.erase(at);
-                op == 2 ? list.RemoveAt(p) : op == 3 ? list.MoveToHead(p) : list.MoveToTail(p);
-                op == 3 ? order.push_front(p) : op != 2 ? order.push_back(p) : void();
+                if (op == 2)
+                    list.RemoveAt(p);
+                else if (op == 3)
+                    list.MoveToHead(p), order.push_front(p);  // the handle written back
+                else
+                    list.MoveToTail(p), order.push_back(p);
             }
             ASSERT_EQ(list.GetCount(), static_cast<int>(order.size()));
             _DorPosition* q = list.GetHeadPosition();
