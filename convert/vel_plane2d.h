@@ -42,7 +42,8 @@ struct VelCrossingTerms {
 };
 
 // Whether segment p0 to p0 + d crosses segment a0 to a0 + e at a point strictly inside both.
-// Parallel segments (cross product exactly 0) never cross. Inline: the triangulations call it for every candidate against every listed edge.
+// Parallel segments (cross product exactly 0) never cross. Inline: the triangulations call it
+// for every candidate against every listed edge.
 inline bool VelSegmentsCrossAlong(const DorVector2& p0, const DorVector2& d, const DorVector2& a0, const DorVector2& e)
 {
     VelCrossingTerms terms(p0, d, a0, e);
