@@ -17,11 +17,15 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
     recentlyCrossed.fill(-1);
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
-    for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
+    for (std::vector<double>* column : Columns())
         column->reserve(maxEdges > 0 ? maxEdges + kBlock : kBlock);
     units.reserve(maxEdges > 0 ? maxEdges : 0);
-    edgeBoxes.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
-    shared.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
+    blocks.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
+}
+
+std::vector<std::vector<double>*> VelEdgeGraph::Columns()
+{
+    return {&fromX, &fromY, &alongX, &alongY, &seenAlongX, &seenAlongY, &seenFromX, &seenFromY, &seenReach};
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
@@ -44,17 +48,18 @@ void VelEdgeGraph::Append(int start, int end)
     edges.push_back(Edge{start, end, 0, -1, -1});
     const size_t at = edges.size() - 1;
     if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
-        for (std::vector<double>* column : {&fromX, &fromY, &alongX, &alongY})
+        for (std::vector<double>* column : Columns())
             column->resize(at + kBlock, 0.0);
-        edgeBoxes.push_back(VelBox());
-        shared.push_back(Shared{start, end});
+        blocks.push_back(Block{VelBox(), start, end, -1});
     }
-    edgeBoxes.back().Grow(plane[start]);
-    edgeBoxes.back().Grow(plane[end]);
-    for (int* v : {&shared.back().a, &shared.back().b}) {
+    Block& block = blocks.back();
+    block.box.Grow(plane[start]);
+    block.box.Grow(plane[end]);
+    for (int* v : {&block.a, &block.b}) {
         if (*v != start && *v != end)
             *v = -1;
     }
+    block.seenFrom = -1;
     DorVector2 unit = VelSub2(plane[end], plane[start]);
     fromX[at] = plane[start].x;
     fromY[at] = plane[start].y;
@@ -135,15 +140,20 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
         return least > margin || most < -margin;
     };
     for (int block = 0; block < count; block += kBlock) {
-        const Shared& ends = shared[block / kBlock];
+        const Block& ends = blocks[block / kBlock];
         if (ends.a == i || ends.a == j || ends.b == i || ends.b == j)
             continue;  // every edge of the block has i or j as an end
-        if (boxes && oneSide(edgeBoxes[block / kBlock]))
+        if (boxes && oneSide(ends.box))
             continue;
+        if (ends.seenFrom != i)
+            SeeBlockFrom(block, i);
+        // VelCrossingTerms::MayCrossInside() with the terms times the sign of s's numerator:
+        // exact, as that only flips signs.
         bool may = false;
         for (int at = block; at < block + kBlock; ++at) {
-            VelCrossingTerms terms(from, along, DorVector2(fromX[at], fromY[at]), DorVector2(alongX[at], alongY[at]));
-            may |= terms.MayCrossInside();
+            double det = seenAlongX[at] * along.y - seenAlongY[at] * along.x;
+            double tNum = along.x * seenFromY[at] - along.y * seenFromX[at];
+            may |= (det > seenReach[at]) & (tNum > 0.0) & (tNum < det);
         }
         if (!may)
             continue;
@@ -156,6 +166,20 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
         }
     }
     return false;
+}
+
+void VelEdgeGraph::SeeBlockFrom(int block, int i) const
+{
+    blocks[block / kBlock].seenFrom = i;
+    for (int at = block; at < block + kBlock; ++at) {
+        const DorVector2 along(alongX[at], alongY[at]), from = VelSub2(DorVector2(fromX[at], fromY[at]), plane[i]);
+        const double sNum = VelCross2(along, from), sign = sNum < 0.0 ? -1.0 : 1.0;
+        seenAlongX[at] = sign * along.x;
+        seenAlongY[at] = sign * along.y;
+        seenFromX[at] = sign * from.x;
+        seenFromY[at] = sign * from.y;
+        seenReach[at] = sNum != 0.0 && !std::isnan(sNum) ? std::fabs(sNum) : std::numeric_limits<double>::infinity();
+    }
 }
 
 // A point is looked at closely only when it lies across the segment's slab and near its line:

@@ -70,11 +70,19 @@ private:
     // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
     // test forms them.
     std::vector<double> fromX, fromY, alongX, alongY;
-    std::vector<VelBox> edgeBoxes;  // per block of edges: the bounds of their ends
-    struct Shared {
-        int a, b;  // points that are an end of every edge of the block, -1 for none
+    // Per edge, the crossing test's terms that depend only on the segment's start, worked out
+    // a block at a time for the start that asks: the edge's direction and its start seen from
+    // there, both times the sign of s's numerator, and that numerator's magnitude, or infinity
+    // where it is 0 or NaN (s is then never in (0, 1); every edge with that start as an end).
+    mutable std::vector<double> seenAlongX, seenAlongY, seenFromX, seenFromY, seenReach;
+    struct Block {
+        VelBox box;      // the bounds of its edges' ends
+        int a, b;        // points that are an end of every edge of the block, -1 for none
+        int seenFrom;    // the start the seen terms are for, -1 for none
     };
-    std::vector<Shared> shared;  // per block of edges
+    mutable std::vector<Block> blocks;
+    void SeeBlockFrom(int block, int i) const;
+    std::vector<std::vector<double>*> Columns();
     // Each loop's points, as added, cut into runs of a block; their first point and first run.
     std::vector<VelRun> runs;
     struct LoopStart {
