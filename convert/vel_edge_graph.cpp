@@ -45,7 +45,7 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
 
 void VelEdgeGraph::Append(int start, int end)
 {
-    edges.push_back(Edge{start, end, 0, -1, -1});
+    edges.push_back(Edge{start, end, 0});
     const size_t at = edges.size() - 1;
     if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
         for (std::vector<double>* column : Columns())
@@ -69,33 +69,12 @@ void VelEdgeGraph::Append(int start, int end)
     units.push_back(unit);
 }
 
-void VelEdgeGraph::AddSegment(int i, int j)
-{
-    const int k = static_cast<int>(edges.size());
-    Append(i, j);
-    firstAppended.resize(plane.size(), -1);
-    lastAppended.resize(plane.size(), -1);
-    for (int v : {i, j}) {
-        int last = lastAppended[v];
-        if (last < 0)
-            firstAppended[v] = k;
-        else
-            (edges[last].start == v ? edges[last].nextAtStart : edges[last].nextAtEnd) = k;
-        lastAppended[v] = k;
-        if (i == j)
-            break;  // a zero-length edge is listed once
-    }
-}
+void VelEdgeGraph::AddSegment(int i, int j) { Append(i, j); }
 
 void VelEdgeGraph::AddLoopEdges(int first, int count)
 {
-    loopEdgeFrom.resize(plane.size(), -1);
-    loopEdgeInto.resize(plane.size(), -1);
-    for (int k = 0; k < count; ++k) {
-        int end = first + (k + 1 < count ? k + 1 : 0);
-        loopEdgeFrom[first + k] = loopEdgeInto[end] = static_cast<int>(edges.size());
-        Append(first + k, end);
-    }
+    for (int k = 0; k < count; ++k)
+        Append(first + k, first + (k + 1 < count ? k + 1 : 0));
     loopEdgeCount = static_cast<int>(edges.size());
 }
 
@@ -256,20 +235,31 @@ bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
     return VelInsideLoop(q, plane.data() + first, count, nullptr, 0);
 }
 
-template <typename F>
-void VelEdgeGraph::ForEdgesAt(int v, F f) const
+// A counting sort of the edges by their ends, in list order within each point.
+void VelEdgeGraph::ListEdgesAtPoints()
 {
-    int from = v < static_cast<int>(loopEdgeFrom.size()) ? loopEdgeFrom[v] : -1;
-    int into = v < static_cast<int>(loopEdgeInto.size()) ? loopEdgeInto[v] : -1;
-    if (from > into)
-        std::swap(from, into);
-    if (from >= 0)
-        f(from);
-    if (into >= 0 && into != from)
-        f(into);
-    for (int k = v < static_cast<int>(firstAppended.size()) ? firstAppended[v] : -1; k >= 0;
-         k = edges[k].start == v ? edges[k].nextAtStart : edges[k].nextAtEnd)
-        f(k);
+    const int n = static_cast<int>(plane.size());
+    edgesAtStart.assign(n + 1, 0);
+    for (const Edge& e : edges) {
+        ++edgesAtStart[e.start];
+        if (e.end != e.start)
+            ++edgesAtStart[e.end];
+    }
+    int total = 0;
+    for (int& start : edgesAtStart) {
+        const int count = start;
+        start = total;
+        total += count;
+    }
+    std::vector<int> next(edgesAtStart.begin(), edgesAtStart.end() - 1);
+    edgesAt.resize(total);
+    for (int k = 0; k < static_cast<int>(edges.size()); ++k) {
+        const Edge& e = edges[k];
+        // From the end, the negated unit: the same numbers as normalising P_start - P_end.
+        edgesAt[next[e.start]++] = EdgeAt{k, e.end, units[k]};
+        if (e.end != e.start)
+            edgesAt[next[e.end]++] = EdgeAt{k, e.start, DorVector2(-units[k].x, -units[k].y)};
+    }
 }
 
 // The other end of the edge at s whose direction is nearest to u on the wanted side of it,
@@ -278,34 +268,32 @@ int VelEdgeGraph::BestNeighbour(int c, int s, const DorVector2& u, bool clockwis
 {
     double best = -1024.0;
     int found = -1;
-    ForEdgesAt(s, [&](int k) {
-        const Edge& e = edges[k];
-        if (k == c)
-            return;
-        int x = e.start == s ? e.end : e.start;
-        // From the end, the negated unit: the same numbers as normalising P_start - P_end.
-        DorVector2 v = e.start == s ? units[k] : DorVector2(-units[k].x, -units[k].y);
-        double cross = VelCross2(u, v);
+    for (int at = edgesAtStart[s]; at < edgesAtStart[s + 1]; ++at) {
+        const EdgeAt& near = edgesAt[at];
+        if (near.edge == c)
+            continue;
+        double cross = VelCross2(u, near.unit);
         if (clockwise ? !(cross < 0.0) : !(cross > 0.0))
-            return;
-        double dot = VelDot2(u, v);
+            continue;
+        double dot = VelDot2(u, near.unit);
         if (dot > best) {
             best = dot;
-            found = x;
+            found = near.other;
         }
-    });
+    }
     return found;
 }
 
+// The earliest edge between p and q, or -1: the first one in either point's list.
 int VelEdgeGraph::FindEdge(int p, int q) const
 {
-    int found = -1;
-    ForEdgesAt(p, [&](int k) {
-        const Edge& e = edges[k];
-        if (found < 0 && (e.start == p ? e.end : e.start) == q)
-            found = k;
-    });
-    return found;
+    if (edgesAtStart[p + 1] - edgesAtStart[p] > edgesAtStart[q + 1] - edgesAtStart[q])
+        std::swap(p, q);
+    for (int at = edgesAtStart[p]; at < edgesAtStart[p + 1]; ++at) {
+        if (edgesAt[at].other == q)
+            return edgesAt[at].edge;
+    }
+    return -1;
 }
 
 // Marks the side of the edge on which the counter-clockwise triangle (a, b, x) lies: its left
@@ -337,6 +325,7 @@ bool VelEdgeGraph::CloseTriangle(int a, int b, int x)
 
 void VelEdgeGraph::CloseTrianglesOnAddedEdges(bool finishOnOpenRight)
 {
+    ListEdgesAtPoints();
     for (int c = loopEdgeCount; c < static_cast<int>(edges.size()); ++c) {
         if (edges[c].sides == (kRightMade | kLeftMade))
             continue;
@@ -365,17 +354,50 @@ bool VelEdgeGraph::IsSliver(int a, int b, int c) const
     return std::sqrt(std::fabs(twiceArea)) <= 1e-5;
 }
 
+namespace {
+// The rotation of a triangle that comes first in index order: equal for triangles equal up to
+// rotation.
+std::array<int, 3> LeastRotation(int a, int b, int c)
+{
+    return std::min({std::array<int, 3>{a, b, c}, std::array<int, 3>{b, c, a}, std::array<int, 3>{c, a, b}});
+}
+
+size_t Hash(const std::array<int, 3>& t)
+{
+    return static_cast<size_t>(t[0]) * 73856093u ^ static_cast<size_t>(t[1]) * 19349663u ^
+           static_cast<size_t>(t[2]) * 83492791u;
+}
+}  // namespace
+
+// The triangles already in indices, then each one appended, go into an open-addressed table of
+// their positions, by least rotation: a repeat is found without going through them all.
 void VelEdgeGraph::EmitDistinct(CDorArray<int, int>& indices, bool dropSlivers) const
 {
+    size_t size = 16;
+    while (size < 2 * static_cast<size_t>(indices.GetSize()) + candidates.size())
+        size *= 2;
+    std::vector<int> table(size, -1);
+    // The slot of t's position if t is there, else the free slot where it would go.
+    auto slotOf = [&](const std::array<int, 3>& t) {
+        size_t h = Hash(t) & (size - 1);
+        for (; table[h] >= 0; h = (h + 1) & (size - 1)) {
+            const int o = table[h];
+            if (LeastRotation(indices[o], indices[o + 1], indices[o + 2]) == t)
+                break;
+        }
+        return h;
+    };
+    for (int o = 0; o + 2 < indices.GetSize(); o += 3) {
+        size_t h = slotOf(LeastRotation(indices[o], indices[o + 1], indices[o + 2]));
+        if (table[h] < 0)
+            table[h] = o;
+    }
     for (size_t t = 0; t + 2 < candidates.size(); t += 3) {
         int a = candidates[t], b = candidates[t + 1], c = candidates[t + 2];
-        bool repeat = false;
-        for (int o = 0; o + 2 < indices.GetSize() && !repeat; o += 3) {
-            int p = indices[o], q = indices[o + 1], r = indices[o + 2];
-            repeat = (p == a && q == b && r == c) || (p == b && q == c && r == a) || (p == c && q == a && r == b);
-        }
-        if (repeat || (dropSlivers && IsSliver(a, b, c)))
+        size_t h = slotOf(LeastRotation(a, b, c));
+        if (table[h] >= 0 || (dropSlivers && IsSliver(a, b, c)))
             continue;
+        table[h] = indices.GetSize();
         indices.Add(a);
         indices.Add(b);
         indices.Add(c);

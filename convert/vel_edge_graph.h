@@ -48,16 +48,13 @@ public:
 private:
     struct Edge {
         int start, end, sides;
-        int nextAtStart, nextAtEnd;  // the next appended edge at either end, -1 for none
     };
     static constexpr int kBlock = 8;  // edges or points screened together
     static constexpr int kRecent = 8;
 
     void Append(int start, int end);
     bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
-    // Calls f(k) for every edge k with v as an end, in list order, each once.
-    template <typename F>
-    void ForEdgesAt(int v, F f) const;
+    void ListEdgesAtPoints();
     int BestNeighbour(int c, int s, const DorVector2& u, bool clockwise) const;
     bool CloseTriangle(int a, int b, int x);
     void MarkSide(int edge, int a, int b, int x);
@@ -90,8 +87,14 @@ private:
     };
     std::vector<LoopStart> loopStarts;
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
-    std::vector<int> loopEdgeFrom, loopEdgeInto;  // per point: its loop edges, -1 for none
-    std::vector<int> firstAppended, lastAppended;  // per point: its appended edges, -1 for none
+    // Per point, the edges with it as an end in list order, each once, for the closing step:
+    // point v's are at [edgesAtStart[v], edgesAtStart[v + 1]).
+    struct EdgeAt {
+        int edge, other;
+        DorVector2 unit;  // from v: the normalised direction, negated for an edge that ends at v
+    };
+    std::vector<EdgeAt> edgesAt;
+    std::vector<int> edgesAtStart;
     // The largest coordinate magnitude, and whether every coordinate is finite.
     double extent = 0.0;
     bool finite = true;
