@@ -96,17 +96,30 @@ bool AcrossQ(const DorVector2& u, const DorVector2& v)
            (u.y > 0.0) != (v.y > 0.0);
 }
 
-// Whether every point of the box is finite and lies strictly above, below or behind the ray, as
-// seen, and within magnitudes where no term's products overflow or underflow. Then no edge
-// between two of them crosses the ray, and its two vectors lie in one open half-plane, where
-// the cross product's sign is exact or the angle is below pi / 2: its term is within a few ulps
-// of the exact angle, whatever its size.
+const double kFar = 1e100, kNear = 1e-100;
+
+// Whether the box and q are finite and within magnitudes where no term's products overflow or
+// underflow.
+bool InRange(const VelBox& box, const DorVector2& q)
+{
+    return box.finite &&
+           std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
+           std::fabs(q.x) < kFar && std::fabs(q.y) < kFar;
+}
+
+// Whether seen vectors u and v, in range, lie both strictly above, below or behind the ray. Then
+// the edge between them does not cross the ray, and they lie in one open half-plane, where the
+// cross product's sign is exact or the angle is below pi / 2: its term is within a few ulps of
+// the exact angle, whatever its size.
+bool OneSide(const DorVector2& u, const DorVector2& v)
+{
+    return (u.y > kNear && v.y > kNear) || (u.y < -kNear && v.y < -kNear) || (u.x < -kNear && v.x < -kNear);
+}
+
+// Whether every point of the box, in range, lies strictly above, below or behind the ray, as
+// seen: OneSide holds for every edge between two of them.
 bool Settled(const VelBox& box, const DorVector2& q, bool turned)
 {
-    const double kFar = 1e100, kNear = 1e-100;
-    if (!box.finite || !(std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
-          std::fabs(q.x) < kFar && std::fabs(q.y) < kFar))
-        return false;
     if (turned)  // seen x is y, seen y is -x
         return q.x - box.maxX > kNear || box.minX - q.x > kNear || q.y - box.maxY > kNear;
     return box.minY - q.y > kNear || q.y - box.maxY > kNear || q.x - box.maxX > kNear;
@@ -126,13 +139,16 @@ Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, b
     int winding = 0, onVertex = -1, onEdge = -1;
     for (int r = 0; r < (runs ? runCount : 1); ++r) {
         const int end = runs ? runs[r].end : count;
+        const bool inRange = runs && InRange(runs[r].box, q);
         // A settled run's inner edges add nothing: only the one to the next run is left.
-        int k = !runs ? 0 : Settled(runs[r].box, q, turned) ? end - 1 : runs[r].first;
+        int k = !runs ? 0 : inRange && Settled(runs[r].box, q, turned) ? end - 1 : runs[r].first;
         DorVector2 u = Seen(loop[k], q, turned);
         for (; k < end; ++k) {
             int next = k + 1 < count ? k + 1 : 0;
             DorVector2 v = Seen(loop[next], q, turned);
-            if (IsZero(u) || IsZero(v)) {
+            if (inRange && k + 1 < end && OneSide(u, v)) {
+                // Like a settled run's, an inner edge on one side adds nothing.
+            } else if (IsZero(u) || IsZero(v)) {
                 int at = IsZero(u) ? k : next;
                 if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
                     return kUnsure;
