@@ -1,5 +1,8 @@
 #include "convert/vel_polygon_triangulation.h"
 
+#include <algorithm>
+#include <vector>
+
 #include "convert/vel_edge_graph.h"
 #include "convert/vel_plane2d.h"
 #include "model/dor_math.h"
@@ -7,26 +10,63 @@
 namespace {
 const int kAddedEdgeBudget = 100;
 
+// The midpoint's inside verdicts by unordered pair, as many as fit, the latest kept: a pair's
+// two orders share their midpoint ((a + b) * 0.5 is the same either way round), so a diagonal's
+// second entry and an outline edge's other order need not go round the outline again.
+class MidpointVerdicts {
+public:
+    explicit MidpointVerdicts(int n) : slots(n > 1024 ? 4096 : 16)
+    {
+        while (slots.size() < 4096 && static_cast<int>(slots.size()) < 4 * n)
+            slots.resize(slots.size() * 2);
+    }
+    bool Inside(const VelEdgeGraph& graph, int i, int j)
+    {
+        Slot& slot = slots[(static_cast<size_t>(std::min(i, j)) * 31 + std::max(i, j)) & (slots.size() - 1)];
+        if (slot.i != std::min(i, j) || slot.j != std::max(i, j)) {
+            DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
+            slot = Slot{std::min(i, j), std::max(i, j), graph.InsideLoop(mid, 0, static_cast<int>(graph.plane.size()))};
+        }
+        return slot.inside;
+    }
+    bool Known(int i, int j) const
+    {
+        const Slot& slot = slots[(static_cast<size_t>(std::min(i, j)) * 31 + std::max(i, j)) & (slots.size() - 1)];
+        return slot.i == std::min(i, j) && slot.j == std::max(i, j);
+    }
+
+private:
+    struct Slot {
+        int i = -1, j = -1;
+        bool inside = false;
+    };
+    std::vector<Slot> slots;
+};
+
 // All three tests must hold, so the order does not change the result: the cheap ones first,
-// the midpoint's, which always goes round the whole outline, last.
-bool Admissible(const VelEdgeGraph& graph, int i, int j)
+// the midpoint's, which always goes round the whole outline, last, unless it is known already
+// or the pair is an outline edge, whose midpoint is seldom inside.
+bool Admissible(const VelEdgeGraph& graph, MidpointVerdicts& verdicts, int i, int j, int n)
 {
-    if (graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughPoint(i, j) || graph.CrossesListedEdge(i, j))
+    if (graph.CrossesRecentlyCrossed(i, j))
         return false;
-    DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-    return graph.InsideLoop(mid, 0, static_cast<int>(graph.plane.size()));
+    const bool alongOutline = j == (i + 1) % n || i == (j + 1) % n;
+    if ((alongOutline || verdicts.Known(i, j)) && !verdicts.Inside(graph, i, j))
+        return false;
+    return !graph.PassesThroughPoint(i, j) && !graph.CrossesListedEdge(i, j) && verdicts.Inside(graph, i, j);
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter
 // and a reflex point enters as a zero-length edge; all of them spend the budget.
 void AddAdmissibleSegments(VelEdgeGraph& graph, int n)
 {
+    MidpointVerdicts verdicts(n);
     for (int i = 0; i < n; ++i) {
         for (int j = 0; j < n; ++j) {
             // Once full, every later candidate would be dropped: stop testing them.
             if (!graph.HasRoom())
                 return;
-            if (Admissible(graph, i, j))
+            if (Admissible(graph, verdicts, i, j, n))
                 graph.AddSegment(i, j);
         }
     }
