@@ -171,7 +171,15 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
     if (lengthSquared == 0.0)
         return false;  // a zero-length segment holds no point
     const int count = static_cast<int>(plane.size());
-    auto onSegment = [&](int k) { return k != i && k != j && VelPointOnSegment(plane[k], a, plane[j]); };
+    auto onSegment = [&](int k) {
+        const bool on = k != i && k != j && VelPointOnSegment(plane[k], a, plane[j]);
+        if (on)
+            recentPoint = k;
+        return on;
+    };
+    // Along a straight wall the next pairs usually pass through the same point.
+    if (recentPoint >= 0 && onSegment(recentPoint))
+        return true;
     if (!(finite && extent < 1e150 && lengthSquared > 1e-200)) {
         for (int k = 0; k < count; ++k) {
             if (onSegment(k))

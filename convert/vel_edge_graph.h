@@ -100,5 +100,6 @@ private:
     bool finite = true;
     // A search hint only: the edges that crossed last, latest first, -1 for none.
     mutable std::array<int, kRecent> recentlyCrossed;
+    mutable int recentPoint = -1;  // the same for the point last found on a segment
     std::vector<int> candidates;  // three per triangle
 };
