@@ -126,8 +126,9 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
             continue;
         if (ends.seenFrom != i)
             SeeBlockFrom(block, i);
-        // VelCrossingTerms::MayCrossInside() with the terms times the sign of s's numerator:
-        // exact, as that only flips signs.
+        // Both quotients lie in (0, 1) only where both numerators are smaller than det and of its
+        // sign: so here, with every term times the sign of s's numerator (exact, as that only
+        // flips signs).
         bool may = false;
         for (int at = block; at < block + kBlock; ++at) {
             double det = seenAlongX[at] * along.y - seenAlongY[at] * along.x;

@@ -31,14 +31,6 @@ struct VelCrossingTerms {
     // A quotient lies in (0, 1) only when its numerator is smaller than det: without this, the
     // segments do not cross. Also false for det = 0 and for NaN, as the quotients would be.
     bool MayCross() const { return std::fabs(sNum) < std::fabs(det) && std::fabs(tNum) < std::fabs(det); }
-    // MayCross() and both numerators of det's sign, without a branch, so that a loop of such
-    // tests runs side by side. Without it, a quotient is not in (0, 1).
-    bool MayCrossInside() const
-    {
-        bool up = det > 0.0, down = det < 0.0;
-        return (std::fabs(sNum) < std::fabs(det)) & (std::fabs(tNum) < std::fabs(det)) &
-               (((sNum > 0.0) & (tNum > 0.0) & up) | ((sNum < 0.0) & (tNum < 0.0) & down));
-    }
 };
 
 // Whether segment p0 to p0 + d crosses segment a0 to a0 + e at a point strictly inside both.

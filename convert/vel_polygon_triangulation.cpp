@@ -15,31 +15,34 @@ const int kAddedEdgeBudget = 100;
 // second entry and an outline edge's other order need not go round the outline again.
 class MidpointVerdicts {
 public:
-    explicit MidpointVerdicts(int n) : slots(n > 1024 ? 4096 : 16)
+    explicit MidpointVerdicts(int n)
     {
-        while (slots.size() < 4096 && static_cast<int>(slots.size()) < 4 * n)
-            slots.resize(slots.size() * 2);
+        size_t size = 16;
+        while (size < 4096 && size < 4 * static_cast<size_t>(n))
+            size *= 2;
+        slots.resize(size);
     }
+    bool Known(int i, int j) { return Holds(SlotOf(i, j), i, j); }
     bool Inside(const VelEdgeGraph& graph, int i, int j)
     {
-        Slot& slot = slots[(static_cast<size_t>(std::min(i, j)) * 31 + std::max(i, j)) & (slots.size() - 1)];
-        if (slot.i != std::min(i, j) || slot.j != std::max(i, j)) {
+        Slot& slot = SlotOf(i, j);
+        if (!Holds(slot, i, j)) {
             DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
             slot = Slot{std::min(i, j), std::max(i, j), graph.InsideLoop(mid, 0, static_cast<int>(graph.plane.size()))};
         }
         return slot.inside;
     }
-    bool Known(int i, int j) const
-    {
-        const Slot& slot = slots[(static_cast<size_t>(std::min(i, j)) * 31 + std::max(i, j)) & (slots.size() - 1)];
-        return slot.i == std::min(i, j) && slot.j == std::max(i, j);
-    }
 
 private:
     struct Slot {
-        int i = -1, j = -1;
+        int low = -1, high = -1;
         bool inside = false;
     };
+    Slot& SlotOf(int i, int j)
+    {
+        return slots[(static_cast<size_t>(std::min(i, j)) * 31 + std::max(i, j)) & (slots.size() - 1)];
+    }
+    static bool Holds(const Slot& slot, int i, int j) { return slot.low == std::min(i, j) && slot.high == std::max(i, j); }
     std::vector<Slot> slots;
 };
 
