@@ -25,7 +25,7 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 
 std::vector<std::vector<double>*> VelEdgeGraph::Columns()
 {
-    return {&fromX, &fromY, &alongX, &alongY, &seenAlongX, &seenAlongY, &seenFromX, &seenFromY, &seenReach};
+    return {&fromX, &fromY, &alongX, &alongY, &seenAlongX, &seenAlongY, &seenFromX, &seenFromY, &seenSNum};
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
@@ -43,7 +43,7 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
     }
 }
 
-void VelEdgeGraph::Append(int start, int end)
+void VelEdgeGraph::AddSegment(int start, int end)
 {
     edges.push_back(Edge{start, end, 0});
     const size_t at = edges.size() - 1;
@@ -69,12 +69,10 @@ void VelEdgeGraph::Append(int start, int end)
     units.push_back(unit);
 }
 
-void VelEdgeGraph::AddSegment(int i, int j) { Append(i, j); }
-
 void VelEdgeGraph::AddLoopEdges(int first, int count)
 {
     for (int k = 0; k < count; ++k)
-        Append(first + k, first + (k + 1 < count ? k + 1 : 0));
+        AddSegment(first + k, first + (k + 1 < count ? k + 1 : 0));
     loopEdgeCount = static_cast<int>(edges.size());
 }
 
@@ -133,7 +131,7 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
         for (int at = block; at < block + kBlock; ++at) {
             double det = seenAlongX[at] * along.y - seenAlongY[at] * along.x;
             double tNum = along.x * seenFromY[at] - along.y * seenFromX[at];
-            may |= (det > seenReach[at]) & (tNum > 0.0) & (tNum < det);
+            may |= (det > seenSNum[at]) & (tNum > 0.0) & (tNum < det);
         }
         if (!may)
             continue;
@@ -158,7 +156,7 @@ void VelEdgeGraph::SeeBlockFrom(int block, int i) const
         seenAlongY[at] = sign * along.y;
         seenFromX[at] = sign * from.x;
         seenFromY[at] = sign * from.y;
-        seenReach[at] = sNum != 0.0 && !std::isnan(sNum) ? std::fabs(sNum) : std::numeric_limits<double>::infinity();
+        seenSNum[at] = sNum != 0.0 && !std::isnan(sNum) ? std::fabs(sNum) : std::numeric_limits<double>::infinity();
     }
 }
 

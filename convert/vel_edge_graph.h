@@ -22,7 +22,7 @@ public:
     void AddLoopEdges(int first, int count);
 
     bool HasRoom() const { return static_cast<int>(edges.size()) < maxEdges; }
-    void AddSegment(int i, int j);
+    void AddSegment(int start, int end);
 
     // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
     bool CrossesListedEdge(int i, int j) const;
@@ -52,7 +52,6 @@ private:
     static constexpr int kBlock = 8;  // edges or points screened together
     static constexpr int kRecent = 8;
 
-    void Append(int start, int end);
     bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
     void ListEdgesAtPoints();
     int BestNeighbour(int c, int s, const DorVector2& u, bool clockwise) const;
@@ -71,7 +70,7 @@ private:
     // a block at a time for the start that asks: the edge's direction and its start seen from
     // there, both times the sign of s's numerator, and that numerator's magnitude, or infinity
     // where it is 0 or NaN (s is then never in (0, 1); every edge with that start as an end).
-    mutable std::vector<double> seenAlongX, seenAlongY, seenFromX, seenFromY, seenReach;
+    mutable std::vector<double> seenAlongX, seenAlongY, seenFromX, seenFromY, seenSNum;
     struct Block {
         VelBox box;      // the bounds of its edges' ends
         int a, b;        // points that are an end of every edge of the block, -1 for none
