@@ -30,7 +30,7 @@ std::vector<std::vector<double>*> VelEdgeGraph::Columns()
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
 {
-    loopStarts.push_back(LoopStart{static_cast<int>(plane.size()), static_cast<int>(runs.size())});
+    loopStarts.push_back(LoopStart{static_cast<int>(plane.size()), static_cast<int>(runs.size()), VelBox()});
     for (int k = 0; k < count; ++k) {
         DorVector3 p = DorTransformPoint(points[k], projection);
         if (k % kBlock == 0)
@@ -38,6 +38,7 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
         plane.push_back(DorVector2(p.x, p.y));
         runs.back().end = k + 1;
         runs.back().box.Grow(plane.back());
+        loopStarts.back().box.Grow(plane.back());
         finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
         extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
     }
@@ -237,9 +238,10 @@ bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
         const int end = last ? static_cast<int>(plane.size()) : loop[1].point;
         const int lastRun = last ? static_cast<int>(runs.size()) : loop[1].run;
         if (end == first + count)
-            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loop->run, lastRun - loop->run);
+            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loop->run, lastRun - loop->run,
+                                 &loop->box);
     }
-    return VelInsideLoop(q, plane.data() + first, count, nullptr, 0);
+    return VelInsideLoop(q, plane.data() + first, count, nullptr, 0, nullptr);
 }
 
 // A counting sort of the edges by their ends, in list order within each point.

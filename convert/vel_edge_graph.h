@@ -79,10 +79,11 @@ private:
     mutable std::vector<Block> blocks;
     void SeeBlockFrom(int block, int i) const;
     std::vector<std::vector<double>*> Columns();
-    // Each loop's points, as added, cut into runs of a block; their first point and first run.
+    // Each loop's points, as added, cut into runs of a block; its first point, first run and bounds.
     std::vector<VelRun> runs;
     struct LoopStart {
         int point, run;
+        VelBox box;
     };
     std::vector<LoopStart> loopStarts;
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs

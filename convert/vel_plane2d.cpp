@@ -184,9 +184,16 @@ Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, b
 }  // namespace
 
 // Where one ray leaves the count unsure (an edge or a vertex along it), the ray a quarter turn
-// round usually does not.
-bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount)
+// round usually does not. A q beyond one side of the bounds, by more than kNear, sees every
+// edge's two vectors in one open half-plane, as in OneSide, so each term is within a few ulps of
+// its exact angle; those add up to 0.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount,
+                   const VelBox* bounds)
 {
+    if (bounds && count <= 1000000 && InRange(*bounds, q) &&
+        (bounds->minX - q.x > kNear || q.x - bounds->maxX > kNear || bounds->minY - q.y > kNear ||
+         q.y - bounds->maxY > kNear))
+        return false;
     Verdict verdict = WindingVerdict(q, loop, count, false, runs, runCount);
     if (verdict == kUnsure)
         verdict = WindingVerdict(q, loop, count, true, runs, runCount);

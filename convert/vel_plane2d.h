@@ -86,8 +86,9 @@ bool VelWindingInside(double angleSum);
 // VelWindingInside(VelWindingAngle(q, loop, count)), without the angles wherever the winding
 // number alone provably gives the same answer. The loop is cut into runs, in order and covering
 // it (or runs is null): the edges within a run whose bounds keep clear of the count's ray and its
-// line are settled together.
-bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount);
+// line are settled together. A q clear of the whole loop's bounds (null for unknown) is outside.
+bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount,
+                   const VelBox* bounds);
 
 // Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
 // vectors from q to the edge's ends is below 0.0001 in magnitude and, once both are normalised,
