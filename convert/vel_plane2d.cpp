@@ -102,9 +102,9 @@ const double kFar = 1e100, kNear = 1e-100;
 // underflow.
 bool InRange(const VelBox& box, const DorVector2& q)
 {
-    return box.finite &&
-           std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)), std::max(std::fabs(box.minY), std::fabs(box.maxY))) < kFar &&
-           std::fabs(q.x) < kFar && std::fabs(q.y) < kFar;
+    const double largest = std::max(std::max(std::fabs(box.minX), std::fabs(box.maxX)),
+                                    std::max(std::fabs(box.minY), std::fabs(box.maxY)));
+    return box.finite && largest < kFar && std::fabs(q.x) < kFar && std::fabs(q.y) < kFar;
 }
 
 // Whether seen vectors u and v, in range, lie both strictly above, below or behind the ray. Then

@@ -42,7 +42,10 @@ private:
     {
         return slots[(static_cast<size_t>(std::min(i, j)) * 31 + std::max(i, j)) & (slots.size() - 1)];
     }
-    static bool Holds(const Slot& slot, int i, int j) { return slot.low == std::min(i, j) && slot.high == std::max(i, j); }
+    static bool Holds(const Slot& slot, int i, int j)
+    {
+        return slot.low == std::min(i, j) && slot.high == std::max(i, j);
+    }
     std::vector<Slot> slots;
 };
 
