@@ -23,7 +23,7 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
     blocks.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
 }
 
-std::vector<std::vector<double>*> VelEdgeGraph::Columns()
+std::array<std::vector<double>*, 9> VelEdgeGraph::Columns()
 {
     return {&fromX, &fromY, &alongX, &alongY, &seenAlongX, &seenAlongY, &seenFromX, &seenFromY, &seenSNum};
 }

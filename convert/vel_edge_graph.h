@@ -78,7 +78,7 @@ private:
     };
     mutable std::vector<Block> blocks;
     void SeeBlockFrom(int block, int i) const;
-    std::vector<std::vector<double>*> Columns();
+    std::array<std::vector<double>*, 9> Columns();  // every per-edge column, for sizing
     // Each loop's points, as added, cut into runs of a block; its first point, first run and bounds.
     std::vector<VelRun> runs;
     struct LoopStart {
