@@ -17,15 +17,14 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
     recentlyCrossed.fill(-1);
     plane.reserve(pointCount > 0 ? pointCount : 0);
     edges.reserve(maxEdges > 0 ? maxEdges : 0);
-    for (std::vector<double>* column : Columns())
-        column->reserve(maxEdges > 0 ? maxEdges + kBlock : kBlock);
+    // The loops' own edges, one per point, come before the budget is checked.
+    const size_t room = (static_cast<size_t>(std::max({maxEdges, pointCount, 1})) + kBlock - 1) / kBlock * kBlock;
+    columns.reset(new double[9 * room]);
+    double** column[] = {&fromX, &fromY, &alongX, &alongY, &seenAlongX, &seenAlongY, &seenFromX, &seenFromY, &seenSNum};
+    for (size_t c = 0; c < 9; ++c)
+        *column[c] = columns.get() + c * room;
     units.reserve(maxEdges > 0 ? maxEdges : 0);
     blocks.reserve(maxEdges > 0 ? maxEdges / kBlock + 1 : 1);
-}
-
-std::array<std::vector<double>*, 9> VelEdgeGraph::Columns()
-{
-    return {&fromX, &fromY, &alongX, &alongY, &seenAlongX, &seenAlongY, &seenFromX, &seenFromY, &seenSNum};
 }
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
@@ -48,9 +47,9 @@ void VelEdgeGraph::AddSegment(int start, int end)
 {
     edges.push_back(Edge{start, end, 0});
     const size_t at = edges.size() - 1;
-    if (at >= fromX.size()) {  // a new block of zero-length edges at 0, which cross nothing
-        for (std::vector<double>* column : Columns())
-            column->resize(at + kBlock, 0.0);
+    if (at % kBlock == 0) {  // a new block of zero-length edges at 0, which cross nothing
+        for (double* column : {fromX, fromY, alongX, alongY})
+            std::fill(column + at, column + at + kBlock, 0.0);
         blocks.push_back(Block{VelBox(), start, end, -1});
     }
     Block& block = blocks.back();
@@ -244,7 +243,8 @@ bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
     return VelInsideLoop(q, plane.data() + first, count, nullptr, 0, nullptr);
 }
 
-// A counting sort of the edges by their ends, in list order within each point.
+// A counting sort of the edges by their ends, in list order within each point: each point's
+// count summed up to it gives where its list ends, and the edges, last to first, fill it from there.
 void VelEdgeGraph::ListEdgesAtPoints()
 {
     const int n = static_cast<int>(plane.size());
@@ -255,19 +255,15 @@ void VelEdgeGraph::ListEdgesAtPoints()
             ++edgesAtStart[e.end];
     }
     int total = 0;
-    for (int& start : edgesAtStart) {
-        const int count = start;
-        start = total;
-        total += count;
-    }
-    std::vector<int> next(edgesAtStart.begin(), edgesAtStart.end() - 1);
+    for (int& end : edgesAtStart)
+        end = total += end;
     edgesAt.resize(total);
-    for (int k = 0; k < static_cast<int>(edges.size()); ++k) {
+    for (int k = static_cast<int>(edges.size()) - 1; k >= 0; --k) {
         const Edge& e = edges[k];
         // From the end, the negated unit: the same numbers as normalising P_start - P_end.
-        edgesAt[next[e.start]++] = EdgeAt{k, e.end, units[k]};
+        edgesAt[--edgesAtStart[e.start]] = EdgeAt{k, e.end, units[k]};
         if (e.end != e.start)
-            edgesAt[next[e.end]++] = EdgeAt{k, e.start, DorVector2(-units[k].x, -units[k].y)};
+            edgesAt[--edgesAtStart[e.end]] = EdgeAt{k, e.start, DorVector2(-units[k].x, -units[k].y)};
     }
 }
 
@@ -335,6 +331,7 @@ bool VelEdgeGraph::CloseTriangle(int a, int b, int x)
 void VelEdgeGraph::CloseTrianglesOnAddedEdges(bool finishOnOpenRight)
 {
     ListEdgesAtPoints();
+    candidates.reserve(6 * (edges.size() - loopEdgeCount));  // at most two triangles an edge
     for (int c = loopEdgeCount; c < static_cast<int>(edges.size()); ++c) {
         if (edges[c].sides == (kRightMade | kLeftMade))
             continue;

@@ -6,6 +6,7 @@
 // Side marks: bit 1, the triangle to the right of start->end has been made; bit 2, the one to
 // its left. Every closed triangle is counter-clockwise in the plane.
 #include <array>
+#include <memory>
 #include <vector>
 
 #include "convert/vel_plane2d.h"
@@ -63,14 +64,16 @@ private:
     int maxEdges;
     int loopEdgeCount = 0;
     std::vector<Edge> edges;
-    // Per edge, padded to whole blocks: its start and its end minus its start, as the crossing
-    // test forms them.
-    std::vector<double> fromX, fromY, alongX, alongY;
+    // Nine columns of room for maxEdges padded to whole blocks, in one allocation, each filled a
+    // block at a time.
+    std::unique_ptr<double[]> columns;
+    // Per edge: its start and its end minus its start, as the crossing test forms them.
+    double *fromX, *fromY, *alongX, *alongY;
     // Per edge, the crossing test's terms that depend only on the segment's start, worked out
     // a block at a time for the start that asks: the edge's direction and its start seen from
     // there, both times the sign of s's numerator, and that numerator's magnitude, or infinity
     // where it is 0 or NaN (s is then never in (0, 1); every edge with that start as an end).
-    mutable std::vector<double> seenAlongX, seenAlongY, seenFromX, seenFromY, seenSNum;
+    double *seenAlongX, *seenAlongY, *seenFromX, *seenFromY, *seenSNum;
     struct Block {
         VelBox box;      // the bounds of its edges' ends
         int a, b;        // points that are an end of every edge of the block, -1 for none
@@ -78,7 +81,6 @@ private:
     };
     mutable std::vector<Block> blocks;
     void SeeBlockFrom(int block, int i) const;
-    std::array<std::vector<double>*, 9> Columns();  // every per-edge column, for sizing
     // Each loop's points, as added, cut into runs of a block; its first point, first run and bounds.
     std::vector<VelRun> runs;
     struct LoopStart {
