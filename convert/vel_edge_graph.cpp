@@ -228,19 +228,14 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
     return false;
 }
 
-bool VelEdgeGraph::InsideLoop(const DorVector2& q, int first, int count) const
+bool VelEdgeGraph::InsideLoop(const DorVector2& q, int loop) const
 {
-    auto loop = std::lower_bound(loopStarts.begin(), loopStarts.end(), first,
-                                 [](const LoopStart& start, int point) { return start.point < point; });
-    if (loop != loopStarts.end() && loop->point == first) {
-        const bool last = loop + 1 == loopStarts.end();
-        const int end = last ? static_cast<int>(plane.size()) : loop[1].point;
-        const int lastRun = last ? static_cast<int>(runs.size()) : loop[1].run;
-        if (end == first + count)
-            return VelInsideLoop(q, plane.data() + first, count, runs.data() + loop->run, lastRun - loop->run,
-                                 &loop->box);
-    }
-    return VelInsideLoop(q, plane.data() + first, count, nullptr, 0, nullptr);
+    const LoopStart& start = loopStarts[loop];
+    const bool last = loop + 1 == static_cast<int>(loopStarts.size());
+    const int end = last ? static_cast<int>(plane.size()) : loopStarts[loop + 1].point;
+    const int endRun = last ? static_cast<int>(runs.size()) : loopStarts[loop + 1].run;
+    return VelInsideLoop(q, plane.data() + start.point, end - start.point, runs.data() + start.run, endRun - start.run,
+                         &start.box);
 }
 
 // A counting sort of the edges by their ends, in list order within each point: each point's

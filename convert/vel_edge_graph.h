@@ -32,8 +32,8 @@ public:
     bool CrossesRecentlyCrossed(int i, int j) const;
     // Whether some point other than i and j lies on segment i-j.
     bool PassesThroughPoint(int i, int j) const;
-    // VelInsideLoop for the points first..first+count-1 as added by one AddProjectedPoints.
-    bool InsideLoop(const DorVector2& q, int first, int count) const;
+    // VelInsideLoop for the points added by the loop-th AddProjectedPoints, counted from 0.
+    bool InsideLoop(const DorVector2& q, int loop) const;
 
     // Closes the triangles on each side of every appended edge, first to last. With
     // finishOnOpenRight, an edge whose right triangle has a neighbour but lacks a closing edge

@@ -67,12 +67,11 @@ bool HoledTriangulation::MidpointInMaterial(const DorVector2& mid) const
 {
     const DorVector2* plane = graph.plane.data();
     const Loop& outline = loops[0];
-    if (!graph.InsideLoop(mid, outline.first, outline.count) &&
-        !VelOnLoopEdge(mid, plane + outline.first, outline.count))
+    if (!graph.InsideLoop(mid, 0) && !VelOnLoopEdge(mid, plane + outline.first, outline.count))
         return false;
     for (size_t h = 1; h < loops.size(); ++h) {
         const DorVector2* hole = plane + loops[h].first;
-        if (graph.InsideLoop(mid, loops[h].first, loops[h].count) && !VelOnLoopEdge(mid, hole, loops[h].count))
+        if (graph.InsideLoop(mid, static_cast<int>(h)) && !VelOnLoopEdge(mid, hole, loops[h].count))
             return false;
     }
     return true;

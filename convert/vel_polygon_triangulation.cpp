@@ -28,7 +28,7 @@ public:
         Slot& slot = SlotOf(i, j);
         if (!Holds(slot, i, j)) {
             DorVector2 mid = VelMidpoint2(graph.plane[i], graph.plane[j]);
-            slot = Slot{std::min(i, j), std::max(i, j), graph.InsideLoop(mid, 0, static_cast<int>(graph.plane.size()))};
+            slot = Slot{std::min(i, j), std::max(i, j), graph.InsideLoop(mid, 0)};
         }
         return slot.inside;
     }
