@@ -34,7 +34,13 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
         DorVector3 p = DorTransformPoint(points[k], projection);
         if (k % kBlock == 0)
             runs.push_back(VelRun{k, k, VelBox()});
+        if (plane.size() % (kBlock * kGroup) == 0)
+            pointGroups.push_back(VelBox());
+        if (plane.size() % kBlock == 0)
+            pointBlocks.push_back(VelBox());
         plane.push_back(DorVector2(p.x, p.y));
+        pointBlocks.back().Grow(plane.back());
+        pointGroups.back().Grow(plane.back());
         runs.back().end = k + 1;
         runs.back().box.Grow(plane.back());
         loopStarts.back().box.Grow(plane.back());
@@ -160,6 +166,12 @@ void VelEdgeGraph::SeeBlockFrom(int block, int i) const
     }
 }
 
+bool VelEdgeGraph::PassesThroughRecentPoint(int i, int j) const
+{
+    return recentPoint >= 0 && recentPoint != i && recentPoint != j &&
+           VelPointOnSegment(plane[recentPoint], plane[i], plane[j]);
+}
+
 // A point is looked at closely only when it lies across the segment's slab and near its line:
 // there the rounding of the foot and the distance is below 1e-14 of the extent, so a point
 // farther than 1e-6 plus that from the line is never taken to be on it.
@@ -176,8 +188,7 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
             recentPoint = k;
         return on;
     };
-    // Along a straight wall the next pairs usually pass through the same point.
-    if (recentPoint >= 0 && onSegment(recentPoint))
+    if (PassesThroughRecentPoint(i, j))
         return true;
     if (!(finite && extent < 1e150 && lengthSquared > 1e-200)) {
         for (int k = 0; k < count; ++k) {
@@ -205,24 +216,27 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
         double along = VelDot2(w, d), across = VelCross2(w, d);
         return (along > 0.0) & (along < lengthSquared) & !(across * across > reachSquared * lengthSquared);
     };
-    // By runs screened without branches, as in the crossing search.
-    for (size_t l = 0; l < loopStarts.size(); ++l) {
-        const int lastRun = l + 1 < loopStarts.size() ? loopStarts[l + 1].run : static_cast<int>(runs.size());
-        for (int r = loopStarts[l].run; r < lastRun; ++r) {
-            if (away(runs[r].box))
-                continue;
-            const int first = loopStarts[l].point + runs[r].first, end = loopStarts[l].point + runs[r].end;
-            bool any = end - first < kBlock;
-            if (!any) {
-                for (int k = first; k < first + kBlock; ++k)
-                    any |= near(k);
-            }
-            if (!any)
-                continue;
-            for (int k = first; k < end; ++k) {
-                if (near(k) && onSegment(k))
-                    return true;
-            }
+    // By groups and blocks, each block screened without branches, as in the crossing search.
+    for (int first = 0; first < count; first += kBlock) {
+        // A whole group first, where there is one: a part of one holds too few points to pay.
+        if (first % (kBlock * kGroup) == 0 && first + kBlock * kGroup <= count &&
+            away(pointGroups[first / (kBlock * kGroup)])) {
+            first += kBlock * (kGroup - 1);
+            continue;
+        }
+        if (away(pointBlocks[first / kBlock]))
+            continue;
+        const int end = std::min(first + kBlock, count);
+        bool any = end - first < kBlock;
+        if (!any) {
+            for (int k = first; k < first + kBlock; ++k)
+                any |= near(k);
+        }
+        if (!any)
+            continue;
+        for (int k = first; k < end; ++k) {
+            if (near(k) && onSegment(k))
+                return true;
         }
     }
     return false;

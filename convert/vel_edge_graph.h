@@ -32,6 +32,9 @@ public:
     bool CrossesRecentlyCrossed(int i, int j) const;
     // Whether some point other than i and j lies on segment i-j.
     bool PassesThroughPoint(int i, int j) const;
+    // The same for the point last found on a segment: along a straight wall the next pairs
+    // usually pass through it too.
+    bool PassesThroughRecentPoint(int i, int j) const;
     // VelInsideLoop for the points added by the loop-th AddProjectedPoints, counted from 0.
     bool InsideLoop(const DorVector2& q, int loop) const;
 
@@ -83,6 +86,9 @@ private:
     void SeeBlockFrom(int block, int i) const;
     // Each loop's points, as added, cut into runs of a block; its first point, first run and bounds.
     std::vector<VelRun> runs;
+    // The bounds of each block of points, loops run together, and of each group of kGroup blocks.
+    static constexpr int kGroup = 8;
+    std::vector<VelBox> pointBlocks, pointGroups;
     struct LoopStart {
         int point, run;
         VelBox box;
