@@ -37,12 +37,8 @@ DorVector3 Direction(const _VelCamera& c) { return (c.target - c.eye) * (1 / Dor
 TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
 {
     const DorVector3 slabLow(10, -4, 2), slabHigh(70, 6, 5), aim(40, 1, 10), cube(10, 10, 10), o(0, 0, 0);
-    const struct {
-        DorVector3 eye, target;
-        double fovy, aspect, zNear;
-        DorVector3 low, high;
-        double sphereDistance;  // 0: not pinned
-    } rows[] = {
+    // sphereDistance 0: not pinned
+    const struct { DorVector3 eye, target; double fovy, aspect, zNear; DorVector3 low, high; double sphereDistance; } rows[] = {
         {{0, -100, 30}, aim, 45, 0.5, 1, slabLow, slabHigh, 0},  // a long flat slab off the origin
         {{0, -50, 0}, o, 90, 0.5, 1, cube * -1.0, cube, std::sqrt(300.0) / std::sin(std::atan(0.5))},
         {{0, -50, 0}, o, 90, 2.0, 1, cube * -1.0, cube, std::sqrt(300.0) / std::sin(DorPi / 4)},
@@ -70,26 +66,23 @@ TEST(FitView, EveryCornerInsideTheViewAndTheClipPlanes)
 }
 
 // A point box keeps the eye's distance; a camera without a direction or with a field of view
-// outside 0..180 degrees is not fitted at all.
+// outside 0..180 degrees is not fitted at all, nor any camera on a box with a corner that is not
+// finite or too large for doubles.
 TEST(FitView, PointBoxKeepsTheDistanceAndUnfittableCamerasAreLeftAlone)
 {
     const DorVector3 o(0, 0, 0), south(0, -30, 0), one(1, 1, 1);
     _VelCamera c = Camera(south, DorVector3(0, 10, 0), 45, 1);
     CVelMathCamera::FitViewToBox(c, one * 5, one * 5);
     EXPECT_TRUE(std::fabs(DorLength(c.target - c.eye) - 40) < 1e-9 && c.target.x == 5 && c.target.z == 5);
-    for (const _VelCamera& before : {Camera(south, o, 0, 1), Camera(south, o, 180, 1), Camera(one, one, 45, 1), Camera(south, o, NAN, 1)}) {
-        c = before;
-        CVelMathCamera::FitViewToSphere(c, one * -1.0, one);
-        CVelMathCamera::FitViewToBox(c, one * -1.0, one);
-        EXPECT_TRUE(SameCameraBits(c, before)) << before.fovy;
-    }
-    // Nor is any camera on a box with a corner that is not finite, or too large for doubles.
-    for (const DorVector3& corner : {DorVector3(NAN, 0, 0), DorVector3(0, HUGE_VAL, 0), one * 1e308}) {
-        const _VelCamera before = Camera(south, o, 45, 1);
-        c = before;
-        CVelMathCamera::FitViewToSphere(c, corner * -1.0, corner);
-        CVelMathCamera::FitViewToBox(c, o, corner);
-        EXPECT_TRUE(SameCameraBits(c, before)) << corner.x << " " << corner.y;
+    const struct { _VelCamera before; DorVector3 corner; } unfittable[] = {
+        {Camera(south, o, 0, 1), one}, {Camera(south, o, 180, 1), one}, {Camera(one, one, 45, 1), one},
+        {Camera(south, o, NAN, 1), one}, {Camera(south, o, 45, 1), DorVector3(NAN, 0, 0)},
+        {Camera(south, o, 45, 1), DorVector3(0, HUGE_VAL, 0)}, {Camera(south, o, 45, 1), one * 1e308}};
+    for (const auto& u : unfittable) {
+        c = u.before;
+        CVelMathCamera::FitViewToSphere(c, u.corner * -1.0, u.corner);
+        CVelMathCamera::FitViewToBox(c, o, u.corner);
+        EXPECT_TRUE(SameCameraBits(c, u.before)) << u.before.fovy << " " << u.corner.x << " " << u.corner.y;
     }
 }
 

@@ -25,11 +25,7 @@ void Apply(_VelCamera& c, Op op, double a, double b, double d, int eyeOnly)
 
 TEST(ViewMatrices, HandDerivedImages)
 {
-    const struct {
-        DorVector3 eye, target;
-        double dist;
-        DorVector3 point, image;
-    } rows[] = {
+    const struct { DorVector3 eye, target; double dist; DorVector3 point, image; } rows[] = {
         {{0, 0, 0}, {1, 0, 0}, 0, {1, -1, 1}, {1, 1, -1}},    // right of the view is +x, world up is +y
         {{0, 0, 10}, {0, 0, 0}, 0, {1, 2, 0}, {1, 2, -10}},  // straight down: no turn about z
         {{1, 2, 3}, {1, 7, 3}, 5, {2, 7, 4}, {1, 1, 0}},     // dist shifts along +z
@@ -90,10 +86,7 @@ TEST(Moves, HandDerivedResultsAndRefusals)
 TEST(ViewportZoom, FitsTheDraggedBoxWithinFiveTimes)
 {
     const int kAny = -99999;  // a refusal may have written the box's size: only some rows pin it
-    const struct {
-        double aspect, x0, y0, x1, y1;
-        int ok, x, y, width, height;
-    } rows[] = {
+    const struct { double aspect, x0, y0, x1, y1; int ok, x, y, width, height; } rows[] = {
         {4.0 / 3, 100, 75, 300, 225, 1, -200, -150, 800, 600},     // doubles about the centre, GL y upward
         {4.0 / 3, 100, 100, 180, 160, 1, -500, -700, 2000, 1500},  // exactly five times
         {4.0 / 3, 100, 100, 150, 130, 0, kAny, kAny, kAny, kAny},  // eight times
@@ -119,10 +112,7 @@ TEST(ApproachCamera, TurnsToHalfThePointedOffsetOrMovesByTheGrowthFactor)
 {
     // fovy 90, viewport 200 high: the pointed plane lies 100 pixels ahead of an eye looking along +y.
     const double s3 = std::sqrt(5.25);
-    const struct {
-        double px, py, height, depth;
-        DorVector3 eye, target;
-    } rows[] = {
+    const struct { double px, py, height, depth; DorVector3 eye, target; } rows[] = {
         {100, 50, 100, 0, {0, 0, 0}, {10 / s3, 20 / s3, 5 / s3}},  // y of the point is up
         {30, -20, 100, 10, {0, 5, 0}, {0, 10, 0}},         // depth moves the eye only
     };

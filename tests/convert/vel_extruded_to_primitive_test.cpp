@@ -75,22 +75,18 @@ TEST(ExtrudedToPrimitive, PrismsWhicheverWayTheirLoopsRun)
     const Loop window = {DorVector3(1, 0, 1), DorVector3(1, 0, 2), DorVector3(2, 0, 2), DorVector3(2, 0, 1)};
     const Loop reversedWall = {wall[0], wall[3], wall[2], wall[1]};
     const DorVector3 z(0, 0, 1), y(0, 0.2, 0);
-    const struct {
-        Loop outline;
-        std::vector<Loop> holes;
-        DorVector3 height;
-        int style, caps;
-        Loop after;  // the outline as the host holds it afterwards
-    } cases[] = {{Square(0, 0, 1, true), {}, z, DorStyleSolid, 3, Square(0, 0, 1)},
-                 {Square(0, 0, 1), {}, z, DorStyleSolid, 2, Square(0, 0, 1)},
-                 {Square(0, 0, 1, true), {}, z, DorStyleWire, 3, Square(0, 0, 1, true)},
-                 {wall, {}, y, DorStyleSolid, 3, wall},
-                 {Square(0, 0, 4, true), {Square(1, 1, 2, true)}, z, DorStyleSolid, 3, Square(0, 0, 4)},
-                 {Square(0, 0, 4), {Square(1, 1, 2)}, z, DorStyleSolid, 1, Square(0, 0, 4)},
-                 {Square(0, 0, 4), {Square(1, 1, 1), triangle}, z, DorStyleSolid, 3, Square(0, 0, 4)},
-                 {Square(0, 0, 4, true), {Square(1, 1, 1), triangle}, z, DorStyleWire, 3, Square(0, 0, 4, true)},
-                 {wall, {window}, y, DorStyleSolid, 3, wall},
-                 {reversedWall, {window}, y, DorStyleSolid, 3, reversedWall}};
+    // after: the outline as the host holds it afterwards
+    const struct { Loop outline; std::vector<Loop> holes; DorVector3 height; int style, caps; Loop after; } cases[] = {
+        {Square(0, 0, 1, true), {}, z, DorStyleSolid, 3, Square(0, 0, 1)},
+        {Square(0, 0, 1), {}, z, DorStyleSolid, 2, Square(0, 0, 1)},
+        {Square(0, 0, 1, true), {}, z, DorStyleWire, 3, Square(0, 0, 1, true)},
+        {wall, {}, y, DorStyleSolid, 3, wall},
+        {Square(0, 0, 4, true), {Square(1, 1, 2, true)}, z, DorStyleSolid, 3, Square(0, 0, 4)},
+        {Square(0, 0, 4), {Square(1, 1, 2)}, z, DorStyleSolid, 1, Square(0, 0, 4)},
+        {Square(0, 0, 4), {Square(1, 1, 1), triangle}, z, DorStyleSolid, 3, Square(0, 0, 4)},
+        {Square(0, 0, 4, true), {Square(1, 1, 1), triangle}, z, DorStyleWire, 3, Square(0, 0, 4, true)},
+        {wall, {window}, y, DorStyleSolid, 3, wall},
+        {reversedWall, {window}, y, DorStyleSolid, 3, reversedWall}};
     for (size_t k = 0; k < sizeof cases / sizeof cases[0]; ++k) {
         SCOPED_TRACE(::testing::Message() << "case " << k);
         const auto& c = cases[k];
@@ -141,11 +137,9 @@ TEST(ExtrudedToPrimitive, ProfilesThatCannotBeJoined)
     block.material.shininess = 3;
     block.top.holes[1].points.SetSize(3);
     block.top.holes.SetSize(2);  // the third pair has no top loop
-    const struct {
-        CDorGeometry* shape;
-        const char *solid, *wire;
-    } cases[] = {{&unequal, "", ""}, {&unequalHoled, "", ""}, {&empty, "", ""}, {&dot, "T4", "L4 S2 S2"},
-                 {&flat, "T4 T4 T4 T4 I4 I4", "L4 L4 L4 L4 S5 S5"}, {&block, "T4 T4 T4 T4 I12 I7", "L4 L4 L4 L4 S5 S5"}};
+    const struct { CDorGeometry* shape; const char *solid, *wire; } cases[] = {
+        {&unequal, "", ""}, {&unequalHoled, "", ""}, {&empty, "", ""}, {&dot, "T4", "L4 S2 S2"},
+        {&flat, "T4 T4 T4 T4 I4 I4", "L4 L4 L4 L4 S5 S5"}, {&block, "T4 T4 T4 T4 I12 I7", "L4 L4 L4 L4 S5 S5"}};
     CVelGroupArray two;
     two.SetSize(2);
     two[1].GroupType = VelGroupPoints;

@@ -28,20 +28,14 @@ TEST(FaceToPrimitive, SolidThenWireFrontAndBack)
 {
     const Loop line = {DorVector3(0, 0, 0), DorVector3(1, 0, 0), DorVector3(2, 0, 0)};
     const DorVector3 up(0, 0, 1);
-    const struct {
-        Loop outline;
-        std::vector<Loop> holes;
-        const char *plain, *holed;  // the layouts made
-        DorVector3 normal;          // of the front
-    } cases[] = {{{}, {}, "", "S0", DorVector3()},
-                 {{DorVector3(1, 2, 3)}, {}, "L2 L2", "L2", DorVector3()},
-                 {{line[0], line[1]}, {}, "L3 L3", "L3", DorVector3()},
-                 {line, {}, "L4 L4", "I3 L4", DorVector3()},
-                 {{line[0], line[1], DorVector3(2, 1e-6, 0)}, {}, "L4 L4", "I3 L4", up * 1e-6},
-                 {{line[0], DorVector3(3, 0, 0), DorVector3(1, 2, 0)}, {}, "I3 L4 L4", "I3 L4", up},
-                 {Square(0, 0, 1), {}, "I4 L5 L5", "I4 L5", up},
-                 {Square(0, 0, 4), {kHole}, "I4 L5 L5", "I7 L5 L4", up},
-                 {Square(0, 0, 4), {{}, {DorVector3(2, 2, 0)}, Square(1, 1, 1)}, "I4 L5 L5", "I9 L5 S0 L2 L5", up}};
+    // plain, holed: the layouts made; normal: that of the front
+    const struct { Loop outline; std::vector<Loop> holes; const char *plain, *holed; DorVector3 normal; } cases[] = {
+        {{}, {}, "", "S0", DorVector3()}, {{DorVector3(1, 2, 3)}, {}, "L2 L2", "L2", DorVector3()},
+        {{line[0], line[1]}, {}, "L3 L3", "L3", DorVector3()}, {line, {}, "L4 L4", "I3 L4", DorVector3()},
+        {{line[0], line[1], DorVector3(2, 1e-6, 0)}, {}, "L4 L4", "I3 L4", up * 1e-6},
+        {{line[0], DorVector3(3, 0, 0), DorVector3(1, 2, 0)}, {}, "I3 L4 L4", "I3 L4", up},
+        {Square(0, 0, 1), {}, "I4 L5 L5", "I4 L5", up}, {Square(0, 0, 4), {kHole}, "I4 L5 L5", "I7 L5 L4", up},
+        {Square(0, 0, 4), {{}, {DorVector3(2, 2, 0)}, Square(1, 1, 1)}, "I4 L5 L5", "I9 L5 S0 L2 L5", up}};
     for (const auto& c : cases) {
         SCOPED_TRACE(::testing::Message() << c.outline.size() << " points, " << c.holes.size() << " holes");
         CDorPolygon plain = Polygon(c.outline);
@@ -95,12 +89,7 @@ TEST(FaceToPrimitive, SolidThenWireFrontAndBack)
 // reads its own texture vectors, never the plain polygon's.
 TEST(FaceToPrimitive, TextureCoordinatesUnderScalesAxesAndOrigins)
 {
-    const struct {
-        bool holed;
-        DorVector3 offset, axis, origin;
-        double scaleU, scaleV;
-        DorVector3 du, dv;
-    } cases[] = {
+    const struct { bool holed; DorVector3 offset, axis, origin; double scaleU, scaleV; DorVector3 du, dv; } cases[] = {
         {false, DorVector3(), DorVector3(), DorVector3(), 2.0, 0.5, DorVector3(0.5, 0, 0), DorVector3(0, 2, 0)},
         {false, DorVector3(), DorVector3(), DorVector3(0.3, 0.3, 0), 1, 1, DorVector3(1, 0, 0), DorVector3(0, 1, 0)},  // no axis: no origin
         {false, DorVector3(), DorVector3(0, 1, 0), DorVector3(), 1, 1, DorVector3(0, -1, 0), DorVector3(1, 0, 0)},  // a quarter turn

@@ -16,9 +16,8 @@ TEST(SceneFile, MistakesAreNamedWithThePlaceAndWhatWasExpected)
     dir.Write("odd.bmp", viewer_test::BmpFile(3, 5));
     const std::string w = R"({"name": "w", "type": "extrusion", "profile": [[0,0,0],[1,0,0],[0,1,0]])";
     const std::string scene = R"({"camera": {"eye": [10, -10, 5], "target": [0, 0, 0]}, "entities": [)";
-    const struct {
-        std::string text, message;  // message without the leading "test.json: "
-    } cases[] = {
+    // message: without the leading "test.json: "
+    const struct { std::string text, message; } cases[] = {
         {"{\n  \"camera\": {\"eye\": [0, 0, 1],,\n}", "line 2, column "},  // then what JSON expected there
         {"{\"camera\": {\"eye\": [1e400", "line 1, column 25: expected valid JSON (number overflow parsing '1e400')"},
         {scene + w + "}]}", "entities[0] (\"w\"): expected \"extrude\" (the vector from the profile to the top face) or \"top\" (the top profile)"},

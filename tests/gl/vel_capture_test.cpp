@@ -38,11 +38,9 @@ TEST(CaptureBitmap, OddWidthRowsArePaddedToFourBytesInTheReservedBits)
 
 TEST(CaptureSize, ZeroOversizedAndUnaddressableAreRefused)
 {
-    const struct {
-        int width, height, max;
-        bool allowed;
-    } rows[] = {{1, 1, 16384, true}, {16384, 16384, 16384, true}, {0, 10, 16384, false}, {10, 0, 16384, false},
-                {16385, 10, 16384, false}, {10, 16385, 16384, false}, {30000, 30000, 65536, false}, {10, 10, 0, false}};
+    const struct { int width, height, max; bool allowed; } rows[] = {
+        {1, 1, 16384, true}, {16384, 16384, 16384, true}, {0, 10, 16384, false}, {10, 0, 16384, false},
+        {16385, 10, 16384, false}, {10, 16385, 16384, false}, {30000, 30000, 65536, false}, {10, 10, 0, false}};
     for (const auto& r : rows)  // 30000 x 30000 would be 3.6 GB of rows; a maximum of 0: no context to ask
         EXPECT_EQ(VelCaptureSizeAllowed(r.width, r.height, r.max, r.max), r.allowed) << r.width << "x" << r.height;
     // Whose 24-bit rows no int counts, or not positive: no bits reserved, the array as it was.

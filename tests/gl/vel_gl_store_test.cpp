@@ -156,19 +156,13 @@ TEST(EntityStore, CentreAndBoundingBoxOfTheFilteredGroups)
     DorVector3 low, high, centre(5, 5, 5);
     model.GetCenterPoint(centre, 0, 1.0);
     EXPECT_TRUE(DorLength(centre) == 0.0 && !model.GetBoundingBox(low, high, 0, 1.0));
-    const struct {
-        int type;
-        double x;
-        float alpha;
-        long drawMode;
-    } entities[] = {{VelGroupIndexed, 2, 1, 2}, {VelGroupPoints, -100, 1, 2}, {VelGroupLines, 700, 1, 2}, {VelGroupLineStrip, 300, 1, 2},
-                    {VelGroupTriangles, 500, 0.5f, 2}, {VelGroupTriangles, 900, 1, 1 | 2}, {VelGroupTriangles, -900, 1, 4}};
+    const struct { int type; double x; float alpha; long drawMode; } entities[] = {
+        {VelGroupIndexed, 2, 1, 2}, {VelGroupPoints, -100, 1, 2}, {VelGroupLines, 700, 1, 2}, {VelGroupLineStrip, 300, 1, 2},
+        {VelGroupTriangles, 500, 0.5f, 2}, {VelGroupTriangles, 900, 1, 1 | 2}, {VelGroupTriangles, -900, 1, 4}};
     for (const auto& e : entities)
         model.AddPrimitive(Primitive({Group(e.type, 3, e.x, e.alpha)}, e.drawMode), scope);
-    const struct {
-        int filter;
-        double scale, low, high;
-    } rows[] = {{0, 1, -100, 702}, {1, 1, 2, 702}, {1 | 2 | 8, 1, 2, 302}, {1 | 2, 2, 1, 251}, {2 | 8, 1, -100, 302}};
+    const struct { int filter; double scale, low, high; } rows[] = {
+        {0, 1, -100, 702}, {1, 1, 2, 702}, {1 | 2 | 8, 1, 2, 302}, {1 | 2, 2, 1, 251}, {2 | 8, 1, -100, 302}};
     for (const auto& r : rows) {
         ASSERT_TRUE(model.GetBoundingBox(low, high, r.filter, r.scale)) << r.filter;
         model.GetCenterPoint(centre, r.filter, r.scale);
@@ -223,13 +217,11 @@ TEST(EntityStore, HandlesThatAreNotLiveAreRefusedUntilTheirAddressIsReused)
 // Texture names count from 1 along the list; a change needs a name in it and the smaller limit.
 TEST(TextureList, PowerOfTwoPixelCountsWithinEachLimitWithWholePixelArrays)
 {
-    const struct {
-        int width, height, bits, missing;
-        bool add, change;
-    } rows[] = {{16, 16, 24, 0, true, true},    {2, 8, 32, 0, true, true},     {1, 64, 1, 0, true, true},
-                {1, 2, 24, 0, true, true},      {512, 512, 24, 0, true, false}, {3, 5, 24, 0, false, false},
-                {1, 1, 24, 0, false, false},    {1024, 512, 24, 0, false, false}, {16, 16, 8, 0, false, false},
-                {16, -16, 24, 0, false, false}, {4, 4, 24, 1, false, false}};
+    const struct { int width, height, bits, missing; bool add, change; } rows[] = {
+        {16, 16, 24, 0, true, true},    {2, 8, 32, 0, true, true},     {1, 64, 1, 0, true, true},
+        {1, 2, 24, 0, true, true},      {512, 512, 24, 0, true, false}, {3, 5, 24, 0, false, false},
+        {1, 1, 24, 0, false, false},    {1024, 512, 24, 0, false, false}, {16, 16, 8, 0, false, false},
+        {16, -16, 24, 0, false, false}, {4, 4, 24, 1, false, false}};
     CVelGLStructure model;
     _DorBitmap first;
     first.info.width = first.info.height = 2;

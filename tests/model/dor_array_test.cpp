@@ -21,9 +21,8 @@ int Tracked::alive = 0;
 // allocates exactly; shrinking keeps the storage and growing back zero-fills.
 TEST(DorArray, GrowthStepShrinkAndZeroFill)
 {
-    const struct {
-        int first, growBy, second, expectedMax;
-    } rows[] = {{10, -1, 11, 14}, {80, -1, 81, 90}, {16000, -1, 16001, 17024}, {10, 2, 30, 30}, {30, 2, 31, 32}, {0, -1, 0, 0}};
+    const struct { int first, growBy, second, expectedMax; } rows[] = {
+        {10, -1, 11, 14}, {80, -1, 81, 90}, {16000, -1, 16001, 17024}, {10, 2, 30, 30}, {30, 2, 31, 32}, {0, -1, 0, 0}};
     for (const auto& r : rows) {
         CDorArray<int, int> a;
         a.SetSize(r.first, r.growBy);

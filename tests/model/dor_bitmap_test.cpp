@@ -8,11 +8,11 @@
 // header a bitmap file needs; impossible requests leave the empty bitmap, previous pixels gone.
 TEST(DorBitmapAllocate, PaddedRowsPaletteAndHeaderOrAnEmptyBitmap)
 {
-    const struct {
-        int width, height, bitCount, rowBytes, entries;  // rowBytes < 0: refused
-    } cases[] = {{101, 50, 24, 304, 0}, {33, 7, 1, 8, 2},  {5, 7, 4, 4, 16},   {3, 7, 8, 4, 256},  {9, 7, 8, 12, 256},
-                 {3, 7, 16, 8, 0},      {3, 7, 32, 12, 0}, {4, -5, 24, 12, 0}, {-1, 10, 24, -1, 0}, {10, 10, 0, -1, 0},
-                 {10, 10, 33, -1, 0},   {10, 10, -8, -1, 0}, {60000, 60000, 32, -1, 0}, {2147483647, 1, 1, -1, 0}};
+    // rowBytes < 0: refused
+    const struct { int width, height, bitCount, rowBytes, entries; } cases[] = {
+        {101, 50, 24, 304, 0}, {33, 7, 1, 8, 2},  {5, 7, 4, 4, 16},   {3, 7, 8, 4, 256},  {9, 7, 8, 12, 256},
+        {3, 7, 16, 8, 0},      {3, 7, 32, 12, 0}, {4, -5, 24, 12, 0}, {-1, 10, 24, -1, 0}, {10, 10, 0, -1, 0},
+        {10, 10, 33, -1, 0},   {10, 10, -8, -1, 0}, {60000, 60000, 32, -1, 0}, {2147483647, 1, 1, -1, 0}};
     for (const auto& c : cases) {
         SCOPED_TRACE(::testing::Message() << c.width << "x" << c.height << "x" << c.bitCount);
         _DorBitmap b;

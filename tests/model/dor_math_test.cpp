@@ -13,11 +13,7 @@ const double kPi = 3.14159265358979323846;
 // the Newell normal is twice the area toward the viewer, normalised only from 0.0001 up.
 TEST(Matrices, RightAnglesAreExactAndTheLeftFactorAppliesFirst)
 {
-    const struct {
-        DorMatrix4x4 m;
-        DorVector3 point, image;
-        bool direction;
-    } rows[] = {
+    const struct { DorMatrix4x4 m; DorVector3 point, image; bool direction; } rows[] = {
         {DorRotateZ(kPi / 2), {1, 0, 0}, {0, 1, 0}, false},  // counter-clockwise about +z
         {DorRotateX(kPi / 2), {0, 1, 0}, {0, 0, 1}, false},
         {DorRotateY(kPi / 2), {0, 0, 1}, {1, 0, 0}, false},

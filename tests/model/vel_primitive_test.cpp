@@ -21,10 +21,10 @@ TEST(TrianglePolys, ClearingKeepsTheLook)
 
 TEST(DrawnElementCount, FollowsTheGroupType)
 {
-    const struct {
-        int type, vertices, triangles, expected;  // expected 12345: refused, count untouched
-    } cases[] = {{0, 5, 0, 5}, {1, 7, 0, 3}, {1, 8, 0, 4}, {2, 1, 0, 0}, {2, 0, 0, -1}, {3, 7, 0, 2}, {3, 3, 0, 1},
-                 {3, 2, 0, 0}, {4, 1, 0, -1}, {5, 6, 0, 4}, {6, 3, 10, 10}, {7, 9, 0, 12345}, {-1, 9, 0, 12345}};
+    // expected 12345: refused, count untouched
+    const struct { int type, vertices, triangles, expected; } cases[] = {
+        {0, 5, 0, 5}, {1, 7, 0, 3}, {1, 8, 0, 4}, {2, 1, 0, 0}, {2, 0, 0, -1}, {3, 7, 0, 2}, {3, 3, 0, 1},
+        {3, 2, 0, 0}, {4, 1, 0, -1}, {5, 6, 0, 4}, {6, 3, 10, 10}, {7, 9, 0, 12345}, {-1, 9, 0, 12345}};
     for (const auto& c : cases) {
         int count = 12345;
         EXPECT_EQ(VelDrawnElementCount(c.type, c.vertices, c.triangles, count), c.expected != 12345) << c.type;
