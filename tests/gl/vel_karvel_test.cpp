@@ -9,7 +9,6 @@
 
 namespace {
 const double kNaN = std::numeric_limits<double>::quiet_NaN();
-const HDC kDC = reinterpret_cast<HDC>(static_cast<uintptr_t>(0x1234));
 }  // namespace
 
 // Each move reads the camera once, applies the camera maths and writes the result back; a refused
@@ -39,7 +38,7 @@ TEST(KarvelCameraWrappers, EachMoveReadsComputesAndWritesBackOnce)
 
     k.camera.zFar = std::numeric_limits<double>::infinity();  // the moves share one write-back
     k.RoundDolly(0, 10);
-    k.current = kDC;  // pixels no int holds are not picked
+    k.current = reinterpret_cast<HDC>(static_cast<uintptr_t>(0x1234));  // pixels no int holds are not picked
     k.hits = {{k.HandleOf(3), 0.5}};
     k.ApproachCamera(DorVector2(kNaN, 150), 100, 1);
     EXPECT_TRUE(k.setCameraCalls == 8 && k.camerasAtHitTest.empty());

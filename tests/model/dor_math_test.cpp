@@ -5,20 +5,16 @@
 
 #include "model/dor_math.h"
 
-namespace {
-const double kPi = 3.14159265358979323846;
-}
-
 // Right angles are exact, the left factor applies first and directions ignore the translation;
 // the Newell normal is twice the area toward the viewer, normalised only from 0.0001 up.
 TEST(Matrices, RightAnglesAreExactAndTheLeftFactorAppliesFirst)
 {
     const struct { DorMatrix4x4 m; DorVector3 point, image; bool direction; } rows[] = {
-        {DorRotateZ(kPi / 2), {1, 0, 0}, {0, 1, 0}, false},  // counter-clockwise about +z
-        {DorRotateX(kPi / 2), {0, 1, 0}, {0, 0, 1}, false},
-        {DorRotateY(kPi / 2), {0, 0, 1}, {1, 0, 0}, false},
-        {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {0, 0, 0}, {0, 1, 0}, false},  // moved, then turned
-        {DorTranslate(1, 0, 0) * DorRotateZ(kPi / 2), {1, 1, 0}, {-1, 1, 0}, true},
+        {DorRotateZ(DorPi / 2), {1, 0, 0}, {0, 1, 0}, false},  // counter-clockwise about +z
+        {DorRotateX(DorPi / 2), {0, 1, 0}, {0, 0, 1}, false},
+        {DorRotateY(DorPi / 2), {0, 0, 1}, {1, 0, 0}, false},
+        {DorTranslate(1, 0, 0) * DorRotateZ(DorPi / 2), {0, 0, 0}, {0, 1, 0}, false},  // moved, then turned
+        {DorTranslate(1, 0, 0) * DorRotateZ(DorPi / 2), {1, 1, 0}, {-1, 1, 0}, true},
     };
     for (const auto& r : rows) {
         DorVector3 p = r.direction ? DorTransformDirection(r.point, r.m) : DorTransformPoint(r.point, r.m);
