@@ -7,19 +7,16 @@ class TestWindow {
 public:
     TestWindow(int clientWidth, int clientHeight)
     {
-        static const char* const className = [] {
-            WNDCLASSA wc = {};
-            wc.style = CS_OWNDC | CS_HREDRAW | CS_VREDRAW;
-            wc.lpfnWndProc = DefWindowProcA;
-            wc.hInstance = GetModuleHandleA(nullptr);
-            wc.lpszClassName = "KarvelTestWindow";
-            RegisterClassA(&wc);
-            return wc.lpszClassName;
-        }();
+        WNDCLASSA wc = {};
+        wc.style = CS_OWNDC | CS_HREDRAW | CS_VREDRAW;
+        wc.lpfnWndProc = DefWindowProcA;
+        wc.hInstance = GetModuleHandleA(nullptr);
+        wc.lpszClassName = "KarvelTestWindow";
+        RegisterClassA(&wc);  // only the first window's registration succeeds; the class stays
         RECT r = {0, 0, clientWidth, clientHeight};
         const DWORD style = WS_OVERLAPPEDWINDOW | WS_CLIPCHILDREN | WS_CLIPSIBLINGS;
         AdjustWindowRect(&r, style, FALSE);
-        hwnd = CreateWindowA(className, "karvel test", style, 0, 0, r.right - r.left, r.bottom - r.top, nullptr, nullptr,
+        hwnd = CreateWindowA(wc.lpszClassName, "karvel test", style, 0, 0, r.right - r.left, r.bottom - r.top, nullptr, nullptr,
                              GetModuleHandleA(nullptr), nullptr);
         ShowWindow(hwnd, SW_SHOW);
         UpdateWindow(hwnd);
