@@ -36,7 +36,6 @@ inline _DorMaterial Matte(float r, float g, float b, float alpha = 1)
     m.diffuse = DorColorValue(r, g, b, alpha);
     m.ambient = DorColorValue(r, g, b, 1);
     m.specular = m.emission = DorColorValue(0, 0, 0, 1);
-    m.shininess = 0;
     return m;
 }
 
@@ -69,12 +68,10 @@ inline CVelPrimitive Rectangle(double x0, double z0, double x1, double z1, doubl
 }
 
 // The camera 10 units in front of the origin on -y, looking along +y with a 90 degree field of
-// view: x to the right, z up, 6 pixels per unit at y = 0.
+// view: x to the right, z up, 6 pixels per unit at y = 0 in a kWidth x kHeight window.
 inline void LookAlongY(CVelGLKarvel& karvel)
 {
-    _VelCamera camera;
-    karvel.GetCamera(camera);
-    karvel.SetCamera(_VelCamera{DorVector3(0, -10, 0), DorVector3(0, 0, 0), 90, 1, 1000, camera.aspect});
+    karvel.SetCamera(_VelCamera{DorVector3(0, -10, 0), DorVector3(0, 0, 0), 90, 1, 1000, double(kWidth) / kHeight});
 }
 
 // A modeller live in a 160 x 120 window, its camera along +y (LookAlongY). Texture 1 is four
@@ -98,17 +95,16 @@ protected:
     }
     void TearDown() override { karvel.Finalize(); }
 
-    // Where the camera puts model point (x, y, z): column and row from the top-left.
-    static void PixelOf(double x, double y, double z, int& col, int& row)
+    // Where the camera puts model point (x, 0, z): column and row from the top-left.
+    static void PixelOf(double x, double z, int& col, int& row)
     {
-        double pixelsPerUnit = kHeight / 2.0 / (10 + y);
-        col = static_cast<int>(kWidth / 2.0 + x * pixelsPerUnit);
-        row = static_cast<int>(kHeight / 2.0 - z * pixelsPerUnit);
+        col = static_cast<int>(kWidth / 2.0 + x * kHeight / 20.0);
+        row = static_cast<int>(kHeight / 2.0 - z * kHeight / 20.0);
     }
     Rgb At(double x, double z)
     {
         int col, row;
-        PixelOf(x, 0, z, col, row);
+        PixelOf(x, z, col, row);
         return PixelAt(col, row);
     }
     _DorPosition* Add(CVelPrimitive p) { return karvel.AddPrimitive(p); }
