@@ -1,12 +1,21 @@
-// The OpenGL modeller in real windows: what a host sees after DrawModel.
+// The OpenGL modeller in real windows: what a host sees after DrawModel, and what checked mode
+// reports to it.
 #include <gtest/gtest.h>
 
 #include <cstdlib>
+#include <functional>
+#include <limits>
+#include <string>
+#include <thread>
 #include <utility>
+#include <vector>
 
+#include "convert/dor_shape.h"
 #include "support/gl_live_modeller.h"
 
 namespace {
+void Collect(const char* message, void* reports) { static_cast<std::vector<std::string>*>(reports)->push_back(message); }
+
 // k: the background, r/g: lit red/green, b: blue through the ambient terms only, m: half-
 // transparent red over blue, d: a white texel (blended to black), o: the overlay's own green.
 bool Shows(char kind, const Rgb& c)
@@ -100,41 +109,83 @@ TEST_F(LiveModeller, EachKindOfGroupDrawsInOneFrame)
 
 TEST_F(LiveModeller, UninitialisedDoesNothingAndASecondWindowKeepsModelTexturesAndCamera)
 {
-    HDC dc1 = window.dc;
     CVelGLKarvel idle;  // the frame, pick and capture calls return at once
     CDorArray<_VelSelect, _VelSelect&> hits;
     _DorBitmap bitmap;
     _DORRECT rect = {0, 0, 8, 8};
-    idle.DrawModel(dc1);
-    idle.HitTest(dc1, 80, 60, hits);
+    idle.DrawModel(window.dc);
+    idle.HitTest(window.dc, 80, 60, hits);
     idle.ToBitmap(bitmap, rect);
     EXPECT_EQ(hits.GetSize() + bitmap.bits.GetSize(), 0);
-    EXPECT_EQ(idle.SetCurrent(dc1), dc1);
+    EXPECT_EQ(idle.SetCurrent(window.dc), window.dc);
 
     karvel.Finalize();
     Add(Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0)));
-    ASSERT_EQ(karvel.Initialize(dc1), 1);
+    ASSERT_EQ(karvel.Initialize(window.dc), 1);
     EXPECT_EQ(karvel.model.entities.GetCount(), 0);  // the first start empties the model
     EXPECT_TRUE(glIsTexture(1));                       // but keeps and uploads the textures
     LookAlongY(karvel);
     Add(Rectangle(-4, -2, 4, 2, 0, Matte(1, 0, 0), true));
     HGLRC context = karvel.context.handle;
-    EXPECT_EQ(karvel.SetCurrent(dc1), dc1);  // already current: nothing is re-created
+    EXPECT_EQ(karvel.SetCurrent(window.dc), window.dc);  // already current: nothing is re-created
     EXPECT_EQ(karvel.context.handle, context);
 
     TestWindow second(2 * kWidth, kHeight);
-    HDC dc2 = second.dc;
-    EXPECT_EQ(karvel.SetCurrent(dc2), dc1);
-    EXPECT_EQ(karvel.GetCurrent(), dc2);
-    karvel.DrawModel(dc2);  // the viewport and camera travel with the modeller
+    EXPECT_EQ(karvel.SetCurrent(second.dc), window.dc);
+    EXPECT_EQ(karvel.GetCurrent(), second.dc);
+    karvel.DrawModel(second.dc);  // the viewport and camera travel with the modeller
     EXPECT_GT(PixelAt(68, 60).r, 150);  // the black texels show the lit red
     EXPECT_LT(PixelAt(92, 60).r, 20);   // the white ones blend it away
-    ASSERT_EQ(karvel.Initialize(dc2), 1);  // takes the second window's viewport and aspect ratio
-    karvel.DrawModel(dc2);
+    ASSERT_EQ(karvel.Initialize(second.dc), 1);  // takes the second window's viewport and aspect ratio
+    karvel.DrawModel(second.dc);
     EXPECT_GT(PixelAt(148, 60).r, 150);
     EXPECT_LT(PixelAt(172, 60).r, 20);
 
-    EXPECT_EQ(karvel.SetCurrent(dc1), dc2);  // and back, with the wide viewport
-    karvel.DrawModel(dc1);
+    EXPECT_EQ(karvel.SetCurrent(window.dc), second.dc);  // and back, with the wide viewport
+    karvel.DrawModel(window.dc);
     EXPECT_GT(PixelAt(148, 60).r, 150);
+}
+
+// Each misuse the library can see is reported to the host's callback, once, and nothing is
+// reported with the mode off.
+TEST_F(LiveModeller, CheckedModeReportsEachMisuseOnce)
+{
+    const double nan = std::numeric_limits<double>::quiet_NaN();
+    _DorPosition* removed = Add(Rectangle(0, 0, 1, 1, 0, Matte(1, 0, 0)));
+    _DorPosition* alias = removed;
+    karvel.RemoveShapeAt(alias);
+    CDorExtruded box(CDorPolygon({{0, 0, 0}, {1, 0, 0}, {1, 1, nan}, {0, 1, 0}}), DorVector3(0, 0, 1));
+    CDorShape shape;
+    shape.Add(&box);
+    _VelCamera camera;
+    karvel.GetCamera(camera);
+    _DorBitmap oneBit;
+    DorBitmapAllocate(oneBit, 8, 8, 1);
+    CVelGLKarvel other;
+    CDorArray<_VelSelect, _VelSelect&> hits;
+    const struct {
+        std::vector<const char*> reports;
+        std::function<void()> misuse;
+    } rows[] = {
+        {{"not live"}, [&] { karvel.SetDrawMode(removed, 0); }},
+        {{"non-finite coordinate"}, [&] { karvel.AddShape(shape); }},
+        {{"non-finite camera"}, [&] { karvel.SetCamera(_VelCamera{camera.eye, camera.target, nan, 1, 100, 1}), LookAlongY(karvel); }},
+        {{"SetCamera called from a thread other"}, [&] { std::thread([&] { LookAlongY(karvel); }).join(); }},
+        {{"AddTexture while live", "texture 2 gets no image"}, [&] { karvel.AddTexture(oneBit), karvel.Initialize(window.dc); }},
+        {{"DrawModel while the modeller's context is not current"}, [&] { other.Initialize(window.dc), karvel.DrawModel(window.dc); }},
+        {{"HitTest while the modeller's context is not current"}, [&] { other.Finalize(), karvel.HitTest(window.dc, 1, 1, hits); }},
+    };
+    for (int on : {1, 0}) {
+        std::vector<std::string> reports;
+        CVelKarvel::SetCheckedMode(on, Collect, &reports);
+        for (const auto& row : rows) {
+            reports.clear();
+            row.misuse();
+            EXPECT_EQ(reports.size(), on ? row.reports.size() : 0u) << row.reports[0] << (reports.empty() ? "" : ": " + reports[0]);
+            for (size_t i = 0; i < reports.size() && i < row.reports.size(); ++i)
+                EXPECT_NE(reports[i].find(row.reports[i]), std::string::npos) << reports[i];
+        }
+        karvel.Initialize(window.dc);
+    }
+    CVelKarvel::SetCheckedMode(0, nullptr, nullptr);
 }
