@@ -1,8 +1,5 @@
 // ToBitmap on a live modeller: the captured pixels, the window afterwards, sizes and leaks.
 #include <gtest/gtest.h>
-#include <windows.h>
-
-#include <cstdint>
 #include <cstdlib>
 
 #include "support/gl_live_modeller.h"
@@ -31,7 +28,7 @@ size_t CommittedBytes()
 unsigned int NextGdiSlot()
 {
     HDC probe = CreateCompatibleDC(nullptr);
-    unsigned int slot = LOWORD(reinterpret_cast<uintptr_t>(probe));
+    unsigned int slot = LOWORD(reinterpret_cast<UINT_PTR>(probe));
     DeleteDC(probe);
     return slot;
 }
