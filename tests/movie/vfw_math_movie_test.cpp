@@ -80,11 +80,10 @@ void ExpectMovie(const char* path, const std::vector<_DorBitmap>& frames)
     std::ifstream in(path, std::ios::binary);
     Bytes d((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
     const _DorBitmap& first = frames[0];
-    Bytes format(reinterpret_cast<const unsigned char*>(&first.info), reinterpret_cast<const unsigned char*>(&first.info + 1));
-    const unsigned char* palette = reinterpret_cast<const unsigned char*>(first.palette.GetData());
-    format.insert(format.end(), palette, palette + 4 * first.palette.GetSize());
+    const size_t header = sizeof first.info, colours = 4 * first.palette.GetSize();
     size_t at = Find(d, "strf", 4, 0) + 8, index = Find(d, "idx1", 4, 0) + 8;
-    EXPECT_TRUE(U32(d, at - 4) == format.size() && Find(d, format.data(), format.size(), at) == at);
+    EXPECT_TRUE(U32(d, at - 4) == header + colours && Find(d, &first.info, header, at) == at &&
+                Find(d, first.palette.GetData(), colours, at + header) == at + header);
     ASSERT_EQ(U32(d, index - 4), 16 * frames.size());
     for (size_t i = 0; i < frames.size(); ++i, at += 8) {
         at = Find(d, frames[i].bits.GetData(), frames[i].bits.GetSize(), at);
