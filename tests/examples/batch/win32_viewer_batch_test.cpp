@@ -76,8 +76,7 @@ public:
     }
     void Mouse(UINT message, WPARAM keys, int x, int y) { SendMessageA(view, message, keys, MAKELPARAM(x, y)); }
     void Key(WPARAM key) { SendMessageA(view, WM_KEYDOWN, key, 0); }
-    void Click(int x, int y) { Drag(WM_LBUTTONDOWN, WM_LBUTTONUP, MK_LBUTTON, x, x, y); }
-    // Along y, in 10-pixel moves, as a hand would drag.
+    // Along y, in 10-pixel moves, as a hand would drag; a click when toX is within 10 of fromX.
     void Drag(UINT down, UINT up, WPARAM button, int fromX, int toX, int y)
     {
         Mouse(down, button, fromX, y);
@@ -99,16 +98,15 @@ private:
     HANDLE output_ = nullptr;
 };
 
+// A PNG file's pixels, rows from the top.
 struct Picture {
-    int width = 0, height = 0;
+    int width = 0, height = 0, channels = 0;
     std::vector<unsigned char> rgb;
 
     explicit Picture(const std::string& png)
     {
-        int channels = 0;
         unsigned char* pixels = stbi_load(png.c_str(), &width, &height, &channels, 3);
-        if (pixels)
-            rgb.assign(pixels, pixels + width * height * 3);
+        rgb.assign(pixels, pixels + (pixels ? width * height * 3 : 0));
         stbi_image_free(pixels);
     }
     // Red, green and blue at x, y; black outside a picture that could not be read.
@@ -182,11 +180,10 @@ TEST_F(ViewerRun, WindowAnswersTheMouseAndKeys)
     EXPECT_GT(before.At(160, 120)[0], 120);
     EXPECT_NE(viewer.Status().find("karvel-snapshot-1.png"), std::string::npos) << viewer.Status();
 
-    viewer.Mouse(WM_LBUTTONDOWN, MK_LBUTTON, 160, 120);
-    viewer.Mouse(WM_LBUTTONUP, 0, 161, 120);  // a pixel's slip is still a click
+    viewer.Drag(WM_LBUTTONDOWN, WM_LBUTTONUP, MK_LBUTTON, 160, 161, 120);  // a pixel's slip is still a click
     EXPECT_EQ(viewer.Status().rfind("red box at (", 0), 0u) << viewer.Status();
     EXPECT_GT(snapshot().At(140, 130)[1], before.At(140, 130)[1] + 40);  // the warm highlight adds green
-    viewer.Click(5, 5);  // on the background: the highlight goes
+    viewer.Drag(WM_LBUTTONDOWN, WM_LBUTTONUP, MK_LBUTTON, 5, 5, 5);  // a click on the background: the highlight goes
     EXPECT_EQ(viewer.Status(), "Nothing here");
 
     viewer.Drag(WM_LBUTTONDOWN, WM_LBUTTONUP, MK_LBUTTON, 100, 200, 120);
