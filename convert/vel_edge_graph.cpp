@@ -188,8 +188,6 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
             recentPoint = k;
         return on;
     };
-    if (PassesThroughRecentPoint(i, j))
-        return true;
     if (!(finite && extent < 1e150 && lengthSquared > 1e-200)) {
         for (int k = 0; k < count; ++k) {
             if (onSegment(k))
@@ -238,6 +236,19 @@ bool VelEdgeGraph::PassesThroughPoint(int i, int j) const
             if (near(k) && onSegment(k))
                 return true;
         }
+    }
+    return false;
+}
+
+bool VelEdgeGraph::Blocked(int i, int j) const
+{
+    if (PassesThroughRecentPoint(i, j))
+        return true;
+    if (pointsFirst ? PassesThroughPoint(i, j) : CrossesListedEdge(i, j))
+        return true;
+    if (pointsFirst ? CrossesListedEdge(i, j) : PassesThroughPoint(i, j)) {
+        pointsFirst = !pointsFirst;
+        return true;
     }
     return false;
 }

@@ -25,16 +25,12 @@ public:
     bool HasRoom() const { return static_cast<int>(edges.size()) < maxEdges; }
     void AddSegment(int start, int end);
 
-    // Whether segment i-j crosses a listed edge that has neither i nor j as an end.
-    bool CrossesListedEdge(int i, int j) const;
-    // The same for the few edges that crossed the last crossing segments: the next pairs in the
-    // search usually cross them too, so they are worth a look before dearer tests.
+    // Whether segment i-j crosses a listed edge that has neither i nor j as an end, or some point
+    // other than i and j lies on it.
+    bool Blocked(int i, int j) const;
+    // Whether it crosses one of the few edges that crossed the last crossing segments: the next
+    // pairs in the search usually cross them too, so they are worth a look before dearer tests.
     bool CrossesRecentlyCrossed(int i, int j) const;
-    // Whether some point other than i and j lies on segment i-j.
-    bool PassesThroughPoint(int i, int j) const;
-    // The same for the point last found on a segment: along a straight wall the next pairs
-    // usually pass through it too.
-    bool PassesThroughRecentPoint(int i, int j) const;
     // VelInsideLoop for the points added by the loop-th AddProjectedPoints, counted from 0.
     bool InsideLoop(const DorVector2& q, int loop) const;
 
@@ -56,6 +52,13 @@ private:
     static constexpr int kBlock = 8;  // edges or points screened together
     static constexpr int kRecent = 8;
 
+    // Blocked's two searches, and the point last found on a segment, which along a straight wall
+    // the next pairs usually pass through too. Of the two searches, the one that said yes last
+    // goes first: combs and walls of many points reject runs of pairs by their points, which
+    // cross nothing, and a field of holes rejects them by its edges.
+    bool CrossesListedEdge(int i, int j) const;
+    bool PassesThroughPoint(int i, int j) const;
+    bool PassesThroughRecentPoint(int i, int j) const;
     bool CrossesEdge(const DorVector2& from, const DorVector2& along, int i, int j, int at) const;
     void ListEdgesAtPoints();
     int BestNeighbour(int c, int s, const DorVector2& u, bool clockwise) const;
@@ -109,5 +112,6 @@ private:
     // A search hint only: the edges that crossed last, latest first, -1 for none.
     mutable std::array<int, kRecent> recentlyCrossed;
     mutable int recentPoint = -1;  // the same for the point last found on a segment
+    mutable bool pointsFirst = true;  // the same for the search Blocked goes through first
     std::vector<int> candidates;  // three per triangle
 };

@@ -77,14 +77,11 @@ bool HoledTriangulation::MidpointInMaterial(const DorVector2& mid) const
     return true;
 }
 
-// All tests must hold, so the order does not change the result. The hints go first. The crossing
-// search, which mostly stops at an early crossing, comes before the point test, which goes through
-// every point unless one lies on the segment: among many holes the point test costs more. The
-// midpoint, tested against every loop, goes last.
+// All tests must hold, so the order does not change the result: the cheap ones first, the
+// midpoint, tested against every loop, last.
 bool HoledTriangulation::Admissible(int i, int j) const
 {
-    if (ClosesLoop(i, j) || graph.CrossesRecentlyCrossed(i, j) || graph.PassesThroughRecentPoint(i, j) ||
-        graph.CrossesListedEdge(i, j) || graph.PassesThroughPoint(i, j))
+    if (ClosesLoop(i, j) || graph.CrossesRecentlyCrossed(i, j) || graph.Blocked(i, j))
         return false;
     return MidpointInMaterial(VelMidpoint2(graph.plane[i], graph.plane[j]));
 }

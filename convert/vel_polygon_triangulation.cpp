@@ -59,7 +59,7 @@ bool Admissible(const VelEdgeGraph& graph, MidpointVerdicts& verdicts, int i, in
     const bool alongOutline = j == (i + 1) % n || i == (j + 1) % n;
     if ((alongOutline || verdicts.Known(i, j)) && !verdicts.Inside(graph, i, j))
         return false;
-    return !graph.PassesThroughPoint(i, j) && !graph.CrossesListedEdge(i, j) && verdicts.Inside(graph, i, j);
+    return !graph.Blocked(i, j) && verdicts.Inside(graph, i, j);
 }
 
 // Every ordered pair is a candidate, so a diagonal enters twice, an outline edge may re-enter
