@@ -167,6 +167,9 @@ TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
     for (int steps : {1, 3, 8, 20})
         shapes.push_back({Stairs(steps), {}});
     shapes.push_back({Square(0, 0, 13), HoleGrid(4)});
+    // Over 128 points with many on the candidates: they lie in several groups of the point search.
+    shapes.push_back({Square(0, 0, 19), HoleGrid(6)});
+    shapes.push_back({families::LPlan(150), {}});
     shapes.push_back({Star(20, 2.0, 1.0), {Square(-0.3, -0.3, 0.6), Square(0.5, 0.5, 0.2)}});
     for (const std::vector<Shape>& more : {RandomHoledShapes(), FlatOnlyShapes()})
         shapes.insert(shapes.end(), more.begin(), more.end());
