@@ -29,7 +29,7 @@ VelEdgeGraph::VelEdgeGraph(int pointCount, int maxEdges_) : maxEdges(maxEdges_)
 
 void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const DorMatrix4x4& projection)
 {
-    loopStarts.push_back(LoopStart{static_cast<int>(plane.size()), static_cast<int>(runs.size()), VelBox()});
+    loopStarts.push_back(LoopStart{static_cast<int>(plane.size()), static_cast<int>(runs.size()), VelBox(), -1});
     for (int k = 0; k < count; ++k) {
         DorVector3 p = DorTransformPoint(points[k], projection);
         if (k % kBlock == 0)
@@ -46,6 +46,12 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
         loopStarts.back().box.Grow(plane.back());
         finite = finite && std::isfinite(p.x) && std::isfinite(p.y);
         extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
+    }
+    LoopStart& loop = loopStarts.back();
+    VelLoopBands bands(plane.data() + loop.point, count, loop.box);
+    if (!bands.Empty()) {
+        loop.bands = static_cast<int>(loopBands.size());
+        loopBands.push_back(std::move(bands));
     }
 }
 
@@ -260,7 +266,7 @@ bool VelEdgeGraph::InsideLoop(const DorVector2& q, int loop) const
     const int end = last ? static_cast<int>(plane.size()) : loopStarts[loop + 1].point;
     const int endRun = last ? static_cast<int>(runs.size()) : loopStarts[loop + 1].run;
     return VelInsideLoop(q, plane.data() + start.point, end - start.point, runs.data() + start.run, endRun - start.run,
-                         &start.box);
+                         &start.box, start.bands >= 0 ? &loopBands[start.bands] : nullptr);
 }
 
 // A counting sort of the edges by their ends, in list order within each point: each point's

@@ -95,8 +95,10 @@ private:
     struct LoopStart {
         int point, run;
         VelBox box;
+        int bands;  // in loopBands, -1 for a loop without
     };
     std::vector<LoopStart> loopStarts;
+    std::vector<VelLoopBands> loopBands;
     std::vector<DorVector2> units;  // per edge: end minus start, normalised as the closing step needs
     // Per point, the edges with it as an end in list order, each once, for the closing step:
     // point v's are at [edgesAtStart[v], edgesAtStart[v + 1]).

@@ -125,18 +125,75 @@ bool Settled(const VelBox& box, const DorVector2& q, bool turned)
     return box.minY - q.y > kNear || q.y - box.maxY > kNear || q.x - box.maxX > kNear;
 }
 
+// The signed crossings of the ray, edge by edge, and the vertex and the edge with q on them.
 // One edge m with q on it may be left out of the count: the rest of the loop runs from v_m round
 // to u_m, so its exact angles add up to phi(u_m) - phi(v_m) + 2 pi C, C its signed crossings of
 // the ray and phi measured from the ray in [0, 2 pi). With u_m and v_m nearly opposite and on
 // either side of the ray's line, that difference is within 1e-11 of -pi when u_m is above the
 // line, +pi otherwise; the term of m itself is computed as the angle sum computes it, within
 // 1e-11 of +-pi. The sum is then within 1e-10 plus its rounding of 2 pi times an integer.
+class RayCount {
+public:
+    RayCount(const DorVector2& q, const DorVector2* loop, int count, bool turned)
+        : q(q), loop(loop), count(count), turned(turned)
+    {
+    }
+    // Counts edge k, from u to v as seen; false once the verdict is unsure.
+    bool Add(int k, const DorVector2& u, const DorVector2& v)
+    {
+        const int next = k + 1 < count ? k + 1 : 0;
+        if (IsZero(u) || IsZero(v)) {
+            int at = IsZero(u) ? k : next;
+            if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
+                return false;
+            onVertex = at;
+            return true;
+        }
+        int crossing = RayCrossing(u, v, kClear);
+        if (crossing == kUnsure) {
+            if (onEdge >= 0 || !AcrossQ(u, v))
+                return false;
+            onEdge = k;
+            // Half a turn each way, as the term and the rest of the loop go round.
+            bool termPositive = EdgeAngle(q, loop[k], loop[next]) > 0.0;
+            winding += (termPositive ? 1 : -1) + (u.y > 0.0 ? -1 : 1);
+            crossing = 0;
+        }
+        winding += crossing * 2;
+        return true;
+    }
+    Verdict Finish() const
+    {
+        int total = winding;
+        if (onVertex >= 0) {
+            if (onEdge >= 0)
+                return kUnsure;
+            const double sumError = count * 1e-14 + static_cast<double>(count) * count * 2e-16;
+            DorVector2 before = Seen(loop[onVertex > 0 ? onVertex - 1 : count - 1], q, turned);
+            DorVector2 after = Seen(loop[onVertex + 1 < count ? onVertex + 1 : 0], q, turned);
+            int crossing = RayCrossing(before, after, kClear + 8 * sumError);
+            if (crossing == kUnsure)
+                return kUnsure;
+            total += crossing * 2;
+        }
+        return total != 0 ? kInside : kOutside;
+    }
+
+private:
+    const DorVector2& q;
+    const DorVector2* loop;
+    int count;
+    bool turned;
+    int winding = 0, onVertex = -1, onEdge = -1;
+};
+
+bool CountableSize(int count) { return count >= 3 && count <= 1000000; }
+
 Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, bool turned, const VelRun* runs, int runCount)
 {
-    if (count < 3 || count > 1000000)
+    if (!CountableSize(count))
         return kUnsure;
-    const double sumError = count * 1e-14 + static_cast<double>(count) * count * 2e-16;
-    int winding = 0, onVertex = -1, onEdge = -1;
+    RayCount rays(q, loop, count, turned);
     for (int r = 0; r < (runs ? runCount : 1); ++r) {
         const int end = runs ? runs[r].end : count;
         const bool inRange = runs && InRange(runs[r].box, q);
@@ -144,57 +201,118 @@ Verdict WindingVerdict(const DorVector2& q, const DorVector2* loop, int count, b
         int k = !runs ? 0 : inRange && Settled(runs[r].box, q, turned) ? end - 1 : runs[r].first;
         DorVector2 u = Seen(loop[k], q, turned);
         for (; k < end; ++k) {
-            int next = k + 1 < count ? k + 1 : 0;
-            DorVector2 v = Seen(loop[next], q, turned);
-            if (inRange && k + 1 < end && OneSide(u, v)) {
-                // Like a settled run's, an inner edge on one side adds nothing.
-            } else if (IsZero(u) || IsZero(v)) {
-                int at = IsZero(u) ? k : next;
-                if ((IsZero(u) && IsZero(v)) || (onVertex >= 0 && onVertex != at))
-                    return kUnsure;
-                onVertex = at;
-            } else {
-                int crossing = RayCrossing(u, v, kClear);
-                if (crossing == kUnsure) {
-                    if (onEdge >= 0 || !AcrossQ(u, v))
-                        return kUnsure;
-                    onEdge = k;
-                    // Half a turn each way, as the term and the rest of the loop go round.
-                    bool termPositive = EdgeAngle(q, loop[k], loop[next]) > 0.0;
-                    winding += (termPositive ? 1 : -1) + (u.y > 0.0 ? -1 : 1);
-                    crossing = 0;
-                }
-                winding += crossing * 2;
-            }
+            DorVector2 v = Seen(loop[k + 1 < count ? k + 1 : 0], q, turned);
+            // Like a settled run's, an inner edge on one side adds nothing.
+            if (!(inRange && k + 1 < end && OneSide(u, v)) && !rays.Add(k, u, v))
+                return kUnsure;
             u = v;
         }
     }
-    if (onVertex >= 0) {
-        if (onEdge >= 0)
-            return kUnsure;
-        DorVector2 before = Seen(loop[onVertex > 0 ? onVertex - 1 : count - 1], q, turned);
-        DorVector2 after = Seen(loop[onVertex + 1 < count ? onVertex + 1 : 0], q, turned);
-        int crossing = RayCrossing(before, after, kClear + 8 * sumError);
-        if (crossing == kUnsure)
-            return kUnsure;
-        winding += crossing * 2;
-    }
-    return winding != 0 ? kInside : kOutside;
+    return rays.Finish();
 }
+
+// The count along the unturned ray over the edges of q's band alone: every other edge lies
+// strictly above or below q, by more than kNear (Covers), so OneSide holds for it.
+Verdict BandVerdict(const DorVector2& q, const DorVector2* loop, int count, const VelLoopBands& bands)
+{
+    RayCount rays(q, loop, count, false);
+    const int *k, *last;
+    bands.EdgesNear(q.y, k, last);
+    for (; k < last; ++k) {
+        DorVector2 u = VelSub2(loop[*k], q), v = VelSub2(loop[*k + 1 < count ? *k + 1 : 0], q);
+        if (!OneSide(u, v) && !rays.Add(*k, u, v))
+            return kUnsure;
+    }
+    return rays.Finish();
+}
+
+// Differences of distinct numbers at least kTiny in magnitude (or 0) are far above kNear.
+const double kTiny = 1e-80;
+
+bool TinyButNotZero(double y) { return y != 0.0 && std::fabs(y) < kTiny; }
 }  // namespace
+
+// The band of y, the same function of y for the edges and the points asked about: as it never
+// decreases with y, an edge listed under bands that all come before (after) y's has both ends below
+// (above) y.
+int VelLoopBands::Band(double y) const
+{
+    const double at = (y - low) * scale;
+    return !(at >= 1.0) ? 0 : at >= bandCount ? bandCount - 1 : static_cast<int>(at);
+}
+
+VelLoopBands::VelLoopBands(const DorVector2* loop, int count, const VelBox& bounds)
+{
+    const double height = bounds.maxY - bounds.minY;
+    if (!CountableSize(count) || count < 16 || !InRange(bounds, DorVector2(0.0, 0.0)) || !(height > 0.0))
+        return;
+    for (int k = 0; k < count; ++k) {
+        if (TinyButNotZero(loop[k].y))
+            return;
+    }
+    low = bounds.minY;
+    bandCount = std::min(count / 2, 4096);
+    scale = bandCount / height;
+    if (!std::isfinite(scale)) {
+        bandCount = 0;
+        return;
+    }
+    auto span = [&](int k, int& first, int& last) {
+        const double a = loop[k].y, b = loop[k + 1 < count ? k + 1 : 0].y;
+        first = Band(std::min(a, b));
+        last = Band(std::max(a, b));
+    };
+    size_t total = 0;
+    for (int k = 0; k < count; ++k) {
+        int first, last;
+        span(k, first, last);
+        total += last - first + 1;
+    }
+    if (total > 16 * static_cast<size_t>(count)) {  // long edges across many bands: no gain
+        bandCount = 0;
+        return;
+    }
+    // Counted, then filled from each band's end, last edge first: each band in edge order.
+    starts.assign(bandCount + 1, 0);
+    for (int k = 0; k < count; ++k) {
+        int first, last;
+        span(k, first, last);
+        for (int b = first; b <= last; ++b)
+            ++starts[b];
+    }
+    for (int b = 0, sum = 0; b <= bandCount; ++b)
+        starts[b] = sum += starts[b];
+    edges.resize(total);
+    for (int k = count - 1; k >= 0; --k) {
+        int first, last;
+        span(k, first, last);
+        for (int b = first; b <= last; ++b)
+            edges[--starts[b]] = k;
+    }
+}
+
+bool VelLoopBands::Covers(double y) const { return !Empty() && !TinyButNotZero(y); }
+
+void VelLoopBands::EdgesNear(double y, const int*& first, const int*& last) const
+{
+    const int b = Band(y);
+    first = edges.data() + starts[b];
+    last = edges.data() + starts[b + 1];
+}
 
 // Where one ray leaves the count unsure (an edge or a vertex along it), the ray a quarter turn
 // round usually does not. A q beyond one side of the bounds, by more than kNear, sees every
 // edge's two vectors in one open half-plane, as in OneSide, so each term is within a few ulps of
 // its exact angle; those add up to 0.
 bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount,
-                   const VelBox* bounds)
+                   const VelBox* bounds, const VelLoopBands* bands)
 {
-    if (bounds && count <= 1000000 && InRange(*bounds, q) &&
-        (bounds->minX - q.x > kNear || q.x - bounds->maxX > kNear || bounds->minY - q.y > kNear ||
-         q.y - bounds->maxY > kNear))
+    const bool inRange = bounds && count <= 1000000 && InRange(*bounds, q);
+    if (inRange && (bounds->minX - q.x > kNear || q.x - bounds->maxX > kNear || bounds->minY - q.y > kNear ||
+                    q.y - bounds->maxY > kNear))
         return false;
-    Verdict verdict = WindingVerdict(q, loop, count, false, runs, runCount);
+    Verdict verdict = inRange && bands && bands->Covers(q.y) ? BandVerdict(q, loop, count, *bands)
+                                                              : WindingVerdict(q, loop, count, false, runs, runCount);
     if (verdict == kUnsure)
         verdict = WindingVerdict(q, loop, count, true, runs, runCount);
     if (verdict != kUnsure)

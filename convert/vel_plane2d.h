@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <vector>
 
 #include "model/dor_types.h"
 
@@ -80,6 +81,27 @@ struct VelRun {
     VelBox box;
 };
 
+// A loop's edges (edge k from point k to the next) listed under each band of y that their ends
+// span, the bands cut evenly over the loop's bounds: a horizontal line through a point meets only
+// the edges of the point's band, and every other edge lies strictly above or below the point.
+// Empty for a loop too small to pay for it, or out of the range where that holds by a margin.
+class VelLoopBands {
+public:
+    VelLoopBands() = default;
+    VelLoopBands(const DorVector2* loop, int count, const VelBox& bounds);
+    bool Empty() const { return bandCount == 0; }
+    // Whether the bands cover y: false when empty, or when y lies too near 0 for the margin.
+    bool Covers(double y) const;
+    // The edges listed under y's band, by number: [first, last).
+    void EdgesNear(double y, const int*& first, const int*& last) const;
+
+private:
+    int Band(double y) const;
+    double low = 0.0, scale = 0.0;
+    int bandCount = 0;
+    std::vector<int> starts, edges;  // band b's edges are edges[starts[b]..starts[b + 1])
+};
+
 // Whether a winding sum puts its point inside: |sum| > pi.
 bool VelWindingInside(double angleSum);
 
@@ -87,8 +109,10 @@ bool VelWindingInside(double angleSum);
 // number alone provably gives the same answer. The loop is cut into runs, in order and covering
 // it (or runs is null): the edges within a run whose bounds keep clear of the count's ray and its
 // line are settled together. A q clear of the whole loop's bounds (null for unknown) is outside.
+// Bands (null or empty for none, the loop's own, its bounds given) leave out every edge away
+// from the ray's line at once.
 bool VelInsideLoop(const DorVector2& q, const DorVector2* loop, int count, const VelRun* runs, int runCount,
-                   const VelBox* bounds);
+                   const VelBox* bounds, const VelLoopBands* bands);
 
 // Whether q lies on an edge of the closed loop[0..count-1], loosely: the cross product of the
 // vectors from q to the edge's ends is below 0.0001 in magnitude and, once both are normalised,
