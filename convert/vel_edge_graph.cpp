@@ -64,9 +64,13 @@ void VelEdgeGraph::AddSegment(int start, int end)
             std::fill(column + at, column + at + kBlock, 0.0);
         blocks.push_back(Block{VelBox(), start, end, -1});
     }
+    if (at % (kBlock * kGroup) == 0)
+        edgeGroups.push_back(VelBox());
+    for (VelBox* box : {&blocks.back().box, &edgeGroups.back()}) {
+        box->Grow(plane[start]);
+        box->Grow(plane[end]);
+    }
     Block& block = blocks.back();
-    block.box.Grow(plane[start]);
-    block.box.Grow(plane[end]);
     for (int* v : {&block.a, &block.b}) {
         if (*v != start && *v != end)
             *v = -1;
@@ -128,7 +132,15 @@ bool VelEdgeGraph::CrossesListedEdge(int i, int j) const
         box.Extremes(from, DorVector2(-along.y, along.x), least, most);
         return least > margin || most < -margin;
     };
+    // Among a few groups, each spans so much of the outline that it seldom keeps clear of a segment.
+    const bool groups = boxes && count >= 4 * kBlock * kGroup;
     for (int block = 0; block < count; block += kBlock) {
+        // A whole group first, where there is one, as in the point search.
+        if (groups && block % (kBlock * kGroup) == 0 && block + kBlock * kGroup <= count &&
+            oneSide(edgeGroups[block / (kBlock * kGroup)])) {
+            block += kBlock * (kGroup - 1);
+            continue;
+        }
         const Block& ends = blocks[block / kBlock];
         if (ends.a == i || ends.a == j || ends.b == i || ends.b == j)
             continue;  // every edge of the block has i or j as an end

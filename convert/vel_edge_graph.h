@@ -50,6 +50,7 @@ private:
         int start, end, sides;
     };
     static constexpr int kBlock = 8;  // edges or points screened together
+    static constexpr int kGroup = 8;  // blocks passed over together
     static constexpr int kRecent = 8;
 
     // Blocked's two searches, and the point last found on a segment, which along a straight wall
@@ -86,11 +87,11 @@ private:
         int seenFrom;    // the start the seen terms are for, -1 for none
     };
     mutable std::vector<Block> blocks;
+    std::vector<VelBox> edgeGroups;  // the bounds of each group of kGroup blocks
     void SeeBlockFrom(int block, int i) const;
     // Each loop's points, as added, cut into runs of a block; its first point, first run and bounds.
     std::vector<VelRun> runs;
     // The bounds of each block of points, loops run together, and of each group of kGroup blocks.
-    static constexpr int kGroup = 8;
     std::vector<VelBox> pointBlocks, pointGroups;
     struct LoopStart {
         int point, run;

@@ -168,8 +168,10 @@ TEST(TriangulationCorpus, SameTrianglesAsThePlainTranscriptions)
         shapes.push_back({Stairs(steps), {}});
     shapes.push_back({Square(0, 0, 13), HoleGrid(4)});
     // Over 128 points with many on the candidates: they lie in several groups of the point search.
+    // Over 256 edges, crossing at every turn: the crossing search checks groups of edges.
     shapes.push_back({Square(0, 0, 19), HoleGrid(6)});
     shapes.push_back({families::LPlan(150), {}});
+    shapes.push_back({families::CrossingStar(301, 3), {}});
     shapes.push_back({Star(20, 2.0, 1.0), {Square(-0.3, -0.3, 0.6), Square(0.5, 0.5, 0.2)}});
     for (const std::vector<Shape>& more : {RandomHoledShapes(), FlatOnlyShapes()})
         shapes.insert(shapes.end(), more.begin(), more.end());
