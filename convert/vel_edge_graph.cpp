@@ -64,18 +64,19 @@ void VelEdgeGraph::AddSegment(int start, int end)
             std::fill(column + at, column + at + kBlock, 0.0);
         blocks.push_back(Block{VelBox(), start, end, -1});
     }
-    if (at % (kBlock * kGroup) == 0)
-        edgeGroups.push_back(VelBox());
-    for (VelBox* box : {&blocks.back().box, &edgeGroups.back()}) {
-        box->Grow(plane[start]);
-        box->Grow(plane[end]);
-    }
     Block& block = blocks.back();
+    block.box.Grow(plane[start]);
+    block.box.Grow(plane[end]);
     for (int* v : {&block.a, &block.b}) {
         if (*v != start && *v != end)
             *v = -1;
     }
     block.seenFrom = -1;
+    if ((at + 1) % (kBlock * kGroup) == 0) {  // a group's last edge: its blocks are complete
+        edgeGroups.push_back(VelBox());
+        for (size_t b = blocks.size() - kGroup; b < blocks.size(); ++b)
+            edgeGroups.back().Grow(blocks[b].box);
+    }
     DorVector2 unit = VelSub2(plane[end], plane[start]);
     fromX[at] = plane[start].x;
     fromY[at] = plane[start].y;

@@ -87,7 +87,7 @@ private:
         int seenFrom;    // the start the seen terms are for, -1 for none
     };
     mutable std::vector<Block> blocks;
-    std::vector<VelBox> edgeGroups;  // the bounds of each group of kGroup blocks
+    std::vector<VelBox> edgeGroups;  // the bounds of each complete group of kGroup blocks
     void SeeBlockFrom(int block, int i) const;
     // Each loop's points, as added, cut into runs of a block; its first point, first run and bounds.
     std::vector<VelRun> runs;

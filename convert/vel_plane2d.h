@@ -63,6 +63,14 @@ struct VelBox {
         maxX = std::max(maxX, p.x);
         maxY = std::max(maxY, p.y);
     }
+    void Grow(const VelBox& box)
+    {
+        finite = finite && box.finite;
+        minX = std::min(minX, box.minX);
+        minY = std::min(minY, box.minY);
+        maxX = std::max(maxX, box.maxX);
+        maxY = std::max(maxY, box.maxY);
+    }
     // The least and the most of c.x (x - a.x) + c.y (y - a.y) over the box, each rounded in
     // five operations: within 6 ulps of 2 (|c.x| + |c.y|) m, m the largest coordinate magnitude
     // of the box and a. Inline: the searches call it for every block.
