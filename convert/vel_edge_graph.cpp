@@ -48,6 +48,8 @@ void VelEdgeGraph::AddProjectedPoints(const DorVector3* points, int count, const
         extent = std::max(extent, std::max(std::fabs(p.x), std::fabs(p.y)));
     }
     LoopStart& loop = loopStarts.back();
+    if (count < VelLoopBands::kLeastPoints)
+        return;
     VelLoopBands bands(plane.data() + loop.point, count, loop.box);
     if (!bands.Empty()) {
         loop.bands = static_cast<int>(loopBands.size());

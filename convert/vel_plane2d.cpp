@@ -244,7 +244,7 @@ int VelLoopBands::Band(double y) const
 VelLoopBands::VelLoopBands(const DorVector2* loop, int count, const VelBox& bounds)
 {
     const double height = bounds.maxY - bounds.minY;
-    if (!CountableSize(count) || count < 16 || !InRange(bounds, DorVector2(0.0, 0.0)) || !(height > 0.0))
+    if (!CountableSize(count) || count < kLeastPoints || !InRange(bounds, DorVector2(0.0, 0.0)) || !(height > 0.0))
         return;
     for (int k = 0; k < count; ++k) {
         if (TinyButNotZero(loop[k].y))

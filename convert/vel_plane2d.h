@@ -95,6 +95,8 @@ struct VelRun {
 // Empty for a loop too small to pay for it, or out of the range where that holds by a margin.
 class VelLoopBands {
 public:
+    static constexpr int kLeastPoints = 16;  // below, going round the loop costs less
+
     VelLoopBands() = default;
     VelLoopBands(const DorVector2* loop, int count, const VelBox& bounds);
     bool Empty() const { return bandCount == 0; }
