@@ -92,7 +92,8 @@ struct VelRun {
 // A loop's edges (edge k from point k to the next) listed under each band of y that their ends
 // span, the bands cut evenly over the loop's bounds: a horizontal line through a point meets only
 // the edges of the point's band, and every other edge lies strictly above or below the point.
-// Empty for a loop too small to pay for it, or out of the range where that holds by a margin.
+// Empty for a loop too small to pay for it, for one whose edges would be listed over 16 times
+// over on average, and out of the range where that holds by a margin.
 class VelLoopBands {
 public:
     static constexpr int kLeastPoints = 16;  // below, going round the loop costs less
